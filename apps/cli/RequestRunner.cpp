@@ -1,0 +1,114 @@
+#include "apps/cli/RequestRunner.h"
+
+#include <QDialog>
+#include <QPushButton>
+#include <QRadioButton>
+#include <cstring>
+
+#include "chart/control/render/ChartExport.h"
+#include "component/cTavixGraph.h"
+#include "component/modMain.h"
+#include "core/Convert.h"
+#include "core/Error.h"
+#include "ui/Prompter.h"
+#include "ui/QtUi.h"
+#include "ui/frmChoose.h"
+
+namespace kg::cli {
+
+namespace {
+
+ui::ScriptedPrompter* g_prompter = nullptr;
+
+const Operation* operationOf(const std::string& name)
+{
+    for (const Operation& op : kOperations)
+        if (equalsNoCase(op.name, name)) return &op;
+    return nullptr;
+}
+
+// Answers the data choice dialog as a user would: click the option, then OK (or Cancel).
+ui::ScriptedPrompter::Answer choiceAnswer(int16_t choice)
+{
+    return [choice](QDialog& dialog) {
+        auto* form = qobject_cast<ui::frmChoose*>(&dialog);
+        if (!form) return;
+        if (choice == kChoiceCancelled) {
+            form->Command2->click();
+            return;
+        }
+        if (choice >= 0 && choice < 7) form->optData[choice]->click();
+        form->Command1->click();
+    };
+}
+
+const char* gridOf(const std::string& request)
+{
+    const char last = request.empty() ? '1' : request.back();
+    return last == '2' ? "grid2" : last == '3' ? "grid3" : "grid1";
+}
+
+}  // namespace
+
+void installOffscreenComponent()
+{
+    ui::installQtUi();
+    auto prompter = std::make_unique<ui::ScriptedPrompter>();
+    g_prompter = prompter.get();
+    ui::setPrompter(std::move(prompter));
+}
+
+bool isRequestName(const std::string& name)
+{
+    const Operation* op = operationOf(name);
+    return op && std::strncmp(op->name, "GenerateChart_", 14) == 0;
+}
+
+bool takesGridArguments(const std::string& request)
+{
+    const Operation* op = operationOf(request);
+    return op && op->kind == OperationKind::Method && op->parameters[0] != '\0';
+}
+
+bool isMeasureRequest(const std::string& r)
+{
+    return equalsNoCase(r, "GenerateChart_BookingsReport") || equalsNoCase(r, "GenerateChart_SalesDeclaration") ||
+           equalsNoCase(r, "GenerateChart_ServCatSumm");
+}
+
+RequestResult runRequest(const Variant& form, const RequestCall& c)
+{
+    g_prompter->messages.clear();
+    g_prompter->answers.clear();
+    if (c.choice) g_prompter->answers.push_back(choiceAnswer(*c.choice));
+    try {
+        auto graph = makeRef<cTavixGraph>();
+        Args sourceForm{form};
+        graph->invoke(0x68030008, kPropertyPutRef, sourceForm);
+        Args args;
+        if (takesGridArguments(c.request)) {
+            int32_t series = 0;
+            if (c.series) {
+                series = *c.series;
+            } else {
+                const Variant grid = call(form, gridOf(c.request));
+                series = toLong(call(grid, "Rows")) - toLong(call(grid, "FixedRows"));
+            }
+            args = {Variant(series), c.total};
+        }
+        graph->invoke(graph->idOfName(c.request), kMethod, args);
+    } catch (const Error& e) {
+        return {Outcome::Failed, "error " + std::to_string(e.number()) + ": " + e.description()};
+    }
+    if (!g_prompter->messages.empty()) return {Outcome::Message, g_prompter->messages.front()};
+    if (c.choice && *c.choice == kChoiceCancelled) return {Outcome::Message, "The data choice was cancelled"};
+    if (!modMain::gfChart || !modMain::gfChart->isShown()) return {Outcome::Failed, "no chart was shown"};
+    return {Outcome::Drawn, {}};
+}
+
+void writeShownChart(const std::string& path, QSize size)
+{
+    control::exportChart(modMain::chartWindow().Chart1(), path, size);
+}
+
+}  // namespace kg::cli

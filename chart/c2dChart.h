@@ -1,0 +1,101 @@
+#pragma once
+// The component's chart model: titles, X range, counts and style switches of the chart on show,
+// prepared from the stored style (InitChart) and drawn into our chart control (DrawChart).
+// Every request builder drives it in one order:
+//   Initialize -> NumSeries, ShowLegend, XMinData, XMaxData -> InitChart -> size the value table
+//   from NumSeries/NumPoints -> XAxisLabels := False -> fill table and label lists -> DrawChart.
+// It reaches the host's application services and settings store late-bound, through the two
+// object sources it is given (the shared goAppServices and goSettings at the moment of the call).
+#include <functional>
+#include <string>
+
+#include "chart/control/model/ChartControl.h"
+#include "core/Dispatch.h"
+
+namespace kg {
+
+class c2dChart : public TableObject {
+public:
+    using ObjectSource = std::function<Variant()>;
+    c2dChart(ObjectSource appServices, ObjectSource settings);
+
+    void Initialize(control::ChartControl* gfChartForm, const std::string& fHeader, const std::string& fFooter,
+                    const std::string& fXTitle, const std::string& fYTitle);
+    void InitChart();
+    void DrawChart(VariantArray& m_vArray);
+    void PrintChart();
+
+    // The bound control; Error 91 before Initialize.
+    control::ChartControl& control() const;
+    bool hasControl() const { return static_cast<bool>(control_); }
+
+    // 3-D view: no field, straight to and from the control.
+    int32_t Rotation() const { return control().chartArea.view3D.rotation; }
+    int32_t Elevation() const { return control().chartArea.view3D.elevation; }
+    int32_t Depth() const { return control().chartArea.view3D.depth; }
+    void setRotation(int32_t v);
+    void setElevation(int32_t v);
+    void setDepth(int32_t v);
+
+    // Stored once per process, shared by every chart object.
+    static bool View3D();
+    static void setView3D(bool b);
+    static bool ShowLegend();
+    static void setShowLegend(bool b);
+
+    bool PointLabels() const { return pointLabels_; }
+    void setPointLabels(bool b) { pointLabels_ = b; }
+    bool XAxisLabels() const { return xAxisLabels_; }
+    void setXAxisLabels(bool b) { xAxisLabels_ = b; }
+    const std::string& ChartHeader() const { return header_; }
+    void setChartHeader(std::string s) { header_ = std::move(s); }
+    const std::string& ChartFooter() const { return footer_; }
+    void setChartFooter(std::string s) { footer_ = std::move(s); }
+    const std::string& ChartXTitle() const { return xTitle_; }
+    void setChartXTitle(std::string s) { xTitle_ = std::move(s); }
+    const std::string& ChartYTitle() const { return yTitle_; }
+    void setChartYTitle(std::string s) { yTitle_ = std::move(s); }
+    int32_t XMaxData() const { return xMax_; }
+    void setXMaxData(int32_t v) { xMax_ = v; }
+    int32_t YMaxData() const { return yMax_; }
+    void setYMaxData(int32_t v) { yMax_ = v; }
+    int32_t XMinData() const { return xMin_; }
+    void setXMinData(int32_t v) { xMin_ = v; }
+    int32_t YMinData() const { return yMin_; }
+    void setYMinData(int32_t v) { yMin_ = v; }
+    int32_t NumSeries() const { return numSeries_; }
+    void setNumSeries(int32_t v) { numSeries_ = v; }
+    int32_t NumPoints() const { return numPoints_; }
+    void setNumPoints(int32_t v) { numPoints_ = v; }
+    int16_t ChartType() const { return chartType_; }
+    void setChartType(int16_t v) { chartType_ = v; }
+    int16_t LineWidth() const { return lineWidth_; }
+    void setLineWidth(int16_t v) { lineWidth_ = v; }
+
+    // Dispatch surface: every property and operation by its name.
+    Variant invoke(DispId id, uint16_t kind, Args& args) override;
+    std::string objectName() const override { return "c2dChart"; }
+
+protected:
+    const std::vector<MemberInfo>& members() const override;
+
+private:
+    void DrawPieChart(VariantArray& table);
+    void addValueLabel(const Variant& cell, int32_t series, int32_t point);
+    void setupLegend();
+    std::string readSetting(const char* key, const char* defaultValue);
+    template <class T>
+    T readWholeSetting(const char* key, const char* defaultValue);
+
+    ObjectSource appServices_, settings_;
+    Ref<control::ChartControl> control_;
+    std::string header_, footer_, xTitle_, yTitle_;
+    int32_t xMax_ = 0, yMax_ = 0, xMin_ = 0, yMin_ = 0;
+    int32_t numSeries_ = 0, numPoints_ = 0;
+    int16_t chartType_ = 0;
+    int16_t lineWidth_ = 0;
+    bool pointLabels_ = false;
+    bool xAxisLabels_ = false;
+};
+
+}  // namespace kg

@@ -1,0 +1,399 @@
+// cTavixGraph driven as a host drives it, through the C entry points and the dispatch ids only:
+// SourceForm, GraphInitialize and the grid requests, with the test stand's form files and with a
+// form the host made itself.
+#include <algorithm>
+#include <cstdio>
+#include <functional>
+
+#include "capi/CapiSupport.h"
+#include "capi/HostForm.h"
+
+namespace {
+
+using namespace capi_test;
+
+constexpr int32_t kHostError = static_cast<int32_t>(0x80040000u);
+
+std::string describe(const KGErrorInfo& err)
+{
+    return "error " + std::to_string(err.number) + ": " + err.description;
+}
+
+class GraphTest : public CapiTest {
+protected:
+    void SetUp() override
+    {
+        CapiTest::SetUp();
+        createGraph(graph);
+    }
+    void TearDown() override
+    {
+        // The shared state outlives the object: let go of the form so no test sees another's.
+        KGErrorInfo err;
+        if (graph.get()) EXPECT_EQ(putSourceForm(graph.get(), nullptr, &err), KG_S_OK) << describe(err);
+        graph.reset();
+        CapiTest::TearDown();
+    }
+
+    int32_t request(int32_t id, KGVariant* args, uint32_t argc, KGErrorInfo* err)
+    {
+        return KGInvoke(graph.get(), id, KG_DISPATCH_METHOD, args, argc, nullptr, err);
+    }
+
+    ObjectRef graph;
+};
+
+// --- Before any SourceForm -----------------------------------------------------------------------
+
+// Runs in a process of its own, so that no other test has stored a form yet.
+using CapiDeathTest = GraphTest;
+
+TEST_F(CapiDeathTest, RequestBeforeSourceFormFailsAtTheSourceFormAfterGraphInitialize)
+{
+    GTEST_FLAG_SET(death_test_style, "threadsafe");
+    EXPECT_EXIT(
+        {
+            KGErrorInfo err;
+            const int32_t initialized = request(KG_DISPID_GRAPHINITIALIZE, nullptr, 0, &err);
+            Var args[2];
+            setLong(args[0].v, 2);
+            setDouble(args[1].v, 57);
+            const int32_t status = request(KG_DISPID_GENERATECHART_HOURLYGRAPH1, &args[0].v, 2, &err);
+            const std::string description = err.description;
+            const bool ok = initialized == KG_S_OK && status == KG_E_EXCEPTION && err.number == 91 &&
+                            description.rfind("Object variable or With block variable not set", 0) == 0;
+            if (!ok) std::fprintf(stderr, "GraphInitialize %d, request %d, %s\n", initialized, status, describe(err).c_str());
+            std::_Exit(ok ? 0 : 1);
+        },
+        ::testing::ExitedWithCode(0), "");
+}
+
+TEST_F(GraphTest, GraphInitializeSucceedsAgainAndAgain)
+{
+    for (int i = 0; i < 3; ++i) {
+        KGErrorInfo err;
+        Var result;
+        EXPECT_EQ(KGInvoke(graph.get(), KG_DISPID_GRAPHINITIALIZE, KG_DISPATCH_METHOD, nullptr, 0, &result.v, &err),
+                  KG_S_OK)
+            << describe(err);
+        EXPECT_EQ(result.v.vt, KG_VT_EMPTY) << "an operation returns nothing but its status";
+    }
+}
+
+TEST_F(GraphTest, RequestAfterSourceFormNothingFailsAtTheSourceForm)
+{
+    KGErrorInfo err;
+    ASSERT_EQ(putSourceForm(graph.get(), nullptr, &err), KG_S_OK) << describe(err);
+    Var args[2];
+    setLong(args[0].v, 2);
+    setDouble(args[1].v, 57);
+    EXPECT_EQ(request(KG_DISPID_GENERATECHART_PROPGRAPH1, &args[0].v, 2, &err), KG_E_EXCEPTION);
+    EXPECT_EQ(err.number, 91) << describe(err);
+}
+
+// --- Requests on a form file -------------------------------------------------------------------
+
+using SetArg = std::function<void(KGVariant&)>;
+
+SetArg longArg(int32_t n) { return [n](KGVariant& v) { setLong(v, n); }; }
+SetArg doubleArg(double d) { return [d](KGVariant& v) { setDouble(v, d); }; }
+SetArg textArg(const char* s) { return [s](KGVariant& v) { KGVariantSetString(&v, s); }; }
+SetArg integerArg(int16_t n)
+{
+    return [n](KGVariant& v) {
+        KGVariantClear(&v);
+        v.vt = KG_VT_I2;
+        v.iVal = n;
+    };
+}
+SetArg emptyArg() { return [](KGVariant& v) { KGVariantClear(&v); }; }
+
+struct FormRequest {
+    const char* name;
+    int32_t id;
+    SetArg lNumSeries, vTotal;  // both unset: a request without arguments
+    int32_t status;
+    int32_t number;  // the error's, when the request fails
+};
+
+class FormRequestTest : public GraphTest, public ::testing::WithParamInterface<FormRequest> {
+protected:
+    void SetUp() override
+    {
+        GraphTest::SetUp();
+        KGErrorInfo err;
+        ASSERT_EQ(KGLoadFormFile(dataFile("grid1.json").c_str(), form.out(), &err), KG_S_OK) << describe(err);
+        ASSERT_EQ(putSourceForm(graph.get(), form.get(), &err), KG_S_OK) << describe(err);
+    }
+    ObjectRef form;
+};
+
+TEST_P(FormRequestTest, EndsWithItsStatusAndLeavesTheArgumentsAsPassed)
+{
+    const FormRequest& c = GetParam();
+    Var args[2], passed[2];
+    uint32_t argc = 0;
+    if (c.lNumSeries) {
+        c.lNumSeries(args[0].v);
+        c.vTotal(args[1].v);
+        argc = 2;
+        for (int i = 0; i < 2; ++i) ASSERT_EQ(KGVariantCopy(&passed[i].v, &args[i].v), KG_S_OK);
+    }
+    KGErrorInfo err;
+    EXPECT_EQ(request(c.id, &args[0].v, argc, &err), c.status) << describe(err);
+    if (KG_FAILED(c.status)) {
+        EXPECT_EQ(err.number, c.number) << describe(err);
+        EXPECT_NE(err.description[0], '\0');
+    }
+    for (uint32_t i = 0; i < argc; ++i) {
+        EXPECT_EQ(args[i].v.vt, passed[i].v.vt) << "argument " << i;
+        switch (passed[i].v.vt) {
+        case KG_VT_I2: EXPECT_EQ(args[i].v.iVal, passed[i].v.iVal); break;
+        case KG_VT_I4: EXPECT_EQ(args[i].v.lVal, passed[i].v.lVal); break;
+        case KG_VT_R8: EXPECT_EQ(args[i].v.dblVal, passed[i].v.dblVal); break;
+        case KG_VT_STRING: EXPECT_STREQ(args[i].v.strVal, passed[i].v.strVal); break;
+        default: break;
+        }
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Cases, FormRequestTest,
+    ::testing::Values(
+        FormRequest{"HourlyGraph1", KG_DISPID_GENERATECHART_HOURLYGRAPH1, longArg(2), doubleArg(57), KG_S_OK, 0},
+        FormRequest{"PropGraph1", KG_DISPID_GENERATECHART_PROPGRAPH1, longArg(2), doubleArg(57), KG_S_OK, 0},
+        FormRequest{"YearlyRpt1WithTextTotal", KG_DISPID_GENERATECHART_YEARLYRPT1, longArg(2), textArg("57"), KG_S_OK, 0},
+        FormRequest{"YearlyRpt1WithIntegerSeries", KG_DISPID_GENERATECHART_YEARLYRPT1, integerArg(2), longArg(88),
+                    KG_S_OK, 0},
+        FormRequest{"EmptyTotalIsTheNoDataMessage", KG_DISPID_GENERATECHART_HOURLYGRAPH1, longArg(2), emptyArg(),
+                    KG_S_OK, 0},
+        FormRequest{"GridTheFormLacks", KG_DISPID_GENERATECHART_HOURLYGRAPH2, longArg(2), doubleArg(57),
+                    KG_E_EXCEPTION, 438},
+        FormRequest{"ThirdGridTheFormLacks", KG_DISPID_GENERATECHART_PROPGRAPH3, longArg(2), emptyArg(), KG_E_EXCEPTION,
+                    438},
+        FormRequest{"SeriesThatIsNoNumber", KG_DISPID_GENERATECHART_HOURLYGRAPH1, textArg("two"), doubleArg(57),
+                    KG_E_EXCEPTION, 13},
+        FormRequest{"SeriesBeyondLong", KG_DISPID_GENERATECHART_HOURLYGRAPH1, doubleArg(3e9), doubleArg(57),
+                    KG_E_EXCEPTION, 6},
+        FormRequest{"SettingsGridTheFormLacks", KG_DISPID_GENERATECHART_BOOKINGSREPORT, nullptr, nullptr,
+                    KG_E_EXCEPTION, 438},
+        FormRequest{"DatePickersTheFormLacks", KG_DISPID_GENERATECHART_JOBSTATUSREPORT, nullptr, nullptr,
+                    KG_E_EXCEPTION, 438}),
+    [](const auto& info) { return std::string(info.param.name); });
+
+// --- Requests on a form the host made ------------------------------------------------------------
+
+// grid1 of the host's form: a caption row and two agents over twelve months and a total.
+const char* const kCells[] = {
+    "",        "Jan", "Feb", "Mar", "Apr", "May", "Jun", "Jul", "Aug", "Sep", "Oct", "Nov", "Dec", "Total",
+    "Agent A", "3",   "5",   "2",   "7",   "4",   "6",   "8",   "1",   "0",   "5",   "9",   "7",   "57",
+    "Agent B", "1",   "0",   "4",   "2",   "3",   "3",   "5",   "6",   "2",   "1",   "0",   "4",   "31",
+};
+
+struct HostRequest {
+    const char* name;
+    HostFailure formFailure, gridFailure;
+    bool emptyTotal;
+    int32_t status;
+    int32_t number;
+    const char* description;  // the error's description, or a part of it (see exactDescription)
+    bool exactDescription;
+};
+
+class HostFormTest : public GraphTest, public ::testing::WithParamInterface<HostRequest> {
+protected:
+    void TearDown() override
+    {
+        GraphTest::TearDown();  // lets go of the form
+        EXPECT_EQ(log.alive, 0) << "the component kept a host object";
+    }
+    HostLog log;
+};
+
+TEST_P(HostFormTest, RequestFailsWithTheHostsErrorAsTheHostReportedIt)
+{
+    const HostRequest& c = GetParam();
+    {
+        ObjectRef form(makeHostForm(log, 3, 1, 14, kCells, c.formFailure, c.gridFailure));
+        KGErrorInfo err;
+        ASSERT_EQ(putSourceForm(graph.get(), form.get(), &err), KG_S_OK) << describe(err);
+    }
+    EXPECT_EQ(log.alive, 2) << "the component holds the form, the form its grid";
+    Var args[2];
+    setLong(args[0].v, 2);
+    if (!c.emptyTotal) setDouble(args[1].v, 57);
+    KGErrorInfo err;
+    ASSERT_EQ(request(KG_DISPID_GENERATECHART_HOURLYGRAPH1, &args[0].v, 2, &err), c.status) << describe(err);
+    if (c.status == KG_S_OK) {
+        // Every cell of the data rows and the captions of the twelve points were read.
+        for (const char* cell : {"textmatrix(1,0)", "textmatrix(0,12)", "textmatrix(1,1)", "textmatrix(2,12)"})
+            EXPECT_NE(std::find(log.calls.begin(), log.calls.end(), cell), log.calls.end()) << cell;
+        return;
+    }
+    EXPECT_EQ(err.number, c.number) << describe(err);
+    if (c.exactDescription) {
+        EXPECT_STREQ(err.description, c.description);
+        EXPECT_STREQ(err.source, "TavixHost");
+    } else {
+        EXPECT_NE(std::string(err.description).find(c.description), std::string::npos) << err.description;
+    }
+}
+
+HostFailure failing(const char* member, int32_t status, int32_t number = 0, const char* description = "")
+{
+    HostFailure f;
+    f.member = member;
+    f.status = status;
+    f.number = number;
+    f.description = description;
+    return f;
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Cases, HostFormTest,
+    ::testing::Values(
+        HostRequest{"Succeeds", {}, {}, false, KG_S_OK, 0, "", false},
+        HostRequest{"FormFailsToHandOutTheGrid",
+                    failing("grid1", KG_E_EXCEPTION, kHostError + 17, "The report grid is being refilled"), {}, false,
+                    KG_E_EXCEPTION, kHostError + 17, "The report grid is being refilled", true},
+        HostRequest{"RowsFail", {}, failing("Rows", KG_E_EXCEPTION, kHostError + 21, "Grid rows are locked"), false,
+                    KG_E_EXCEPTION, kHostError + 21, "Grid rows are locked", true},
+        HostRequest{"RowsFailEvenWithAnEmptyTotal", {},
+                    failing("Rows", KG_E_EXCEPTION, kHostError + 21, "Grid rows are locked"), true, KG_E_EXCEPTION,
+                    kHostError + 21, "Grid rows are locked", true},
+        HostRequest{"FixedRowsFailWithARunTimeError", {},
+                    failing("FixedRows", KG_E_EXCEPTION, 9, "Subscript out of range"), false, KG_E_EXCEPTION, 9,
+                    "Subscript out of range", true},
+        HostRequest{"CellFails", {},
+                    failing("textmatrix", KG_E_EXCEPTION, kHostError + 30, "Cell (1, 1) cannot be read"), false,
+                    KG_E_EXCEPTION, kHostError + 30, "Cell (1, 1) cannot be read", true},
+        HostRequest{"HostSaysMemberNotFound", {}, failing("Rows", KG_E_MEMBERNOTFOUND), false, KG_E_EXCEPTION, 438,
+                    "grid1.Rows", false},
+        HostRequest{"HostSaysTypeMismatch", {}, failing("cols", KG_E_TYPEMISMATCH), false, KG_E_EXCEPTION, 13,
+                    "grid1.cols", false},
+        HostRequest{"HostFailsWithAStatusOfItsOwn", {}, failing("textmatrix", KG_E_FAIL), false, KG_E_EXCEPTION,
+                    KG_E_FAIL, "Automation error", false}),
+    [](const auto& info) { return std::string(info.param.name); });
+
+struct NoDataCase {
+    const char* name;
+    int32_t rows;       // 1: the caption row only
+    bool emptyTotal;
+};
+
+class NoDataTest : public GraphTest, public ::testing::WithParamInterface<NoDataCase> {
+protected:
+    HostLog log;  // outlives the form, which the component lets go of only at the end of the test
+};
+
+TEST_P(NoDataTest, SucceedsAfterReadingRowsAndFixedRowsOnly)
+{
+    const NoDataCase& c = GetParam();
+    {
+        ObjectRef form(makeHostForm(log, c.rows, 1, 14, kCells));
+        KGErrorInfo err;
+        ASSERT_EQ(putSourceForm(graph.get(), form.get(), &err), KG_S_OK) << describe(err);
+    }
+    Var args[2];
+    setLong(args[0].v, 2);
+    if (!c.emptyTotal) setDouble(args[1].v, 57);
+    KGErrorInfo err;
+    EXPECT_EQ(request(KG_DISPID_GENERATECHART_YEARLYRPT1, &args[0].v, 2, &err), KG_S_OK) << describe(err);
+    EXPECT_EQ(log.calls, (std::vector<std::string>{"grid1", "Rows", "FixedRows"}));
+    EXPECT_EQ(args[1].v.vt, c.emptyTotal ? KG_VT_EMPTY : KG_VT_R8);
+}
+
+INSTANTIATE_TEST_SUITE_P(Cases, NoDataTest,
+                         ::testing::Values(NoDataCase{"EmptyTotal", 3, true}, NoDataCase{"NoDataRows", 1, false},
+                                           NoDataCase{"Both", 1, true}),
+                         [](const auto& info) { return std::string(info.param.name); });
+
+TEST_F(GraphTest, ReplacingTheSourceFormReleasesTheOldOne)
+{
+    HostLog first, second;
+    KGErrorInfo err;
+    {
+        ObjectRef a(makeHostForm(first, 3, 1, 14, kCells));
+        ObjectRef b(makeHostForm(second, 3, 1, 14, kCells));
+        ASSERT_EQ(putSourceForm(graph.get(), a.get(), &err), KG_S_OK) << describe(err);
+        ASSERT_EQ(putSourceForm(graph.get(), b.get(), &err), KG_S_OK) << describe(err);
+    }
+    EXPECT_EQ(first.alive, 0);
+    EXPECT_EQ(second.alive, 2);
+    ASSERT_EQ(putSourceForm(graph.get(), nullptr, &err), KG_S_OK) << describe(err);
+    EXPECT_EQ(second.alive, 0);
+}
+
+// --- Form files and host options ---------------------------------------------------------------
+
+struct FormFileCase {
+    const char* name;
+    std::string path;
+    int32_t status;
+    int32_t number;
+    const char* mentions;  // a part of the description
+};
+
+class FormFileTest : public CapiTest, public ::testing::WithParamInterface<FormFileCase> {};
+
+TEST_P(FormFileTest, LoadsAFormOrSaysWhatIsWrong)
+{
+    const FormFileCase& c = GetParam();
+    ObjectRef form;
+    KGErrorInfo err;
+    ASSERT_EQ(KGLoadFormFile(c.path.c_str(), form.out(), &err), c.status) << describe(err);
+    if (c.status == KG_S_OK) {
+        // The form hands out its grid by name, without regard to case.
+        Var grid, rows;
+        ASSERT_EQ(KGInvokeByName(form.get(), "Grid1", KG_DISPATCH_PROPERTYGET, nullptr, 0, &grid.v, &err), KG_S_OK)
+            << describe(err);
+        ASSERT_EQ(grid.v.vt, KG_VT_OBJECT);
+        ASSERT_EQ(KGInvokeByName(grid.v.objVal, "ROWS", KG_DISPATCH_PROPERTYGET, nullptr, 0, &rows.v, &err), KG_S_OK)
+            << describe(err);
+        EXPECT_EQ(rows.v.vt, KG_VT_I4);
+        EXPECT_EQ(rows.v.lVal, 3);
+        return;
+    }
+    EXPECT_EQ(form.get(), nullptr);
+    EXPECT_EQ(err.number, c.number) << describe(err);
+    EXPECT_NE(std::string(err.description).find(c.mentions), std::string::npos) << err.description;
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Cases, FormFileTest,
+    ::testing::Values(FormFileCase{"Good", dataFile("grid1.json"), KG_S_OK, 0, ""},
+                      FormFileCase{"Missing", dataFile("no-such-form.json"), KG_E_EXCEPTION, 53, "no-such-form.json"},
+                      FormFileCase{"RaggedGrid", dataFile("ragged.json"), KG_E_EXCEPTION, kHostError + 1, "ragged.json"}),
+    [](const auto& info) { return std::string(info.param.name); });
+
+struct HostOptionCase {
+    const char* name;
+    const char* key;
+    const char* value;
+    int32_t status;
+};
+
+class HostOptionTest : public CapiTest, public ::testing::WithParamInterface<HostOptionCase> {};
+
+TEST_P(HostOptionTest, KnownKeysOnly)
+{
+    const HostOptionCase& c = GetParam();
+    EXPECT_EQ(KGSetHostOption(c.key, c.value), c.status);
+    KGErrorInfo info;
+    EXPECT_EQ(KGGetLastError(&info), KG_FAILED(c.status) && c.key ? KG_S_OK : KG_S_FALSE) << info.description;
+    KGSetHostOption(c.key ? c.key : "settingsOwner", nullptr);  // back to the default
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Cases, HostOptionTest,
+    ::testing::Values(HostOptionCase{"SettingsOwner", "settingsOwner", "Tavix Test", KG_S_OK},
+                      HostOptionCase{"EventLogFile", "eventLogFile", "", KG_S_OK},
+                      HostOptionCase{"EventLogToStderrYes", "eventLogToStderr", "yes", KG_S_OK},
+                      HostOptionCase{"EventLogToStderrZero", "eventLogToStderr", "0", KG_S_OK},
+                      HostOptionCase{"EventLogToStderrMaybe", "eventLogToStderr", "maybe", KG_E_INVALIDARG},
+                      HostOptionCase{"JobsDatabase", "jobsDatabase", "/tmp/jobs.db", KG_S_OK},
+                      HostOptionCase{"UnknownKey", "printerName", "x", KG_E_INVALIDARG},
+                      HostOptionCase{"NoKey", nullptr, "x", KG_E_POINTER}),
+    [](const auto& info) { return std::string(info.param.name); });
+
+}  // namespace

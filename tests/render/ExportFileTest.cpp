@@ -1,0 +1,130 @@
+// Files: the format follows the extension, and a failed export leaves nothing behind.
+#include <gtest/gtest.h>
+
+#include <QDir>
+#include <QFile>
+#include <QImage>
+
+#include "chart/control/render/ChartExport.h"
+#include "core/Error.h"
+#include "render/RenderSamples.h"
+
+namespace kg::control {
+namespace {
+
+void sampleChart(ChartControl& c)
+{
+    samples::styleLikeTheChartObject(c, "Export");
+    samples::fillTable(c, 3, 5, kBar);
+    samples::addSeriesLabels(c, 3);
+    samples::addPointLabels(c, 5);
+}
+
+QByteArray readAll(const QString& path)
+{
+    QFile f(path);
+    return f.open(QIODevice::ReadOnly) ? f.readAll() : QByteArray();
+}
+
+struct FormatCase {
+    const char* name;
+    const char* file;
+    const char* magic;
+};
+
+class ExportFormatTest : public ::testing::TestWithParam<FormatCase> {};
+
+TEST_P(ExportFormatTest, WritesTheFormatTheExtensionNames)
+{
+    ChartControl chart;
+    sampleChart(chart);
+    QTemporaryDir dir = samples::scratchDir();
+    const QString path = dir.filePath(QString::fromUtf8(GetParam().file));
+    exportChart(chart, path.toStdString(), QSize(640, 480));
+    const QByteArray bytes = readAll(path);
+    EXPECT_TRUE(bytes.contains(GetParam().magic)) << bytes.left(64).toStdString();
+    EXPECT_EQ(QDir(dir.path()).entryList(QDir::Files).size(), 1);  // no temporary file left over
+}
+
+INSTANTIATE_TEST_SUITE_P(Formats, ExportFormatTest,
+                         ::testing::Values(FormatCase{"png", "chart.png", "\x89PNG"},
+                                           FormatCase{"pngUpperCase", "chart.PNG", "\x89PNG"},
+                                           FormatCase{"svg", "chart.svg", "<svg"},
+                                           FormatCase{"pdf", "chart.pdf", "%PDF"}),
+                         [](const auto& info) { return std::string(info.param.name); });
+
+TEST(ExportFileTest, PngHasTheRequestedSizeAndIsNotBlank)
+{
+    ChartControl chart;
+    sampleChart(chart);
+    QTemporaryDir dir = samples::scratchDir();
+    const QString path = dir.filePath(QStringLiteral("chart.png"));
+    exportChart(chart, path.toStdString(), QSize(800, 600));
+    const QImage image(path);
+    ASSERT_FALSE(image.isNull());
+    EXPECT_EQ(image.size(), QSize(800, 600));
+    QSet<QRgb> colours;
+    for (int y = 0; y < image.height(); y += 4)
+        for (int x = 0; x < image.width(); x += 4) colours.insert(image.pixel(x, y));
+    EXPECT_GE(colours.size(), 8);
+    // The same picture as the in-memory rendering.
+    EXPECT_EQ(image.convertToFormat(QImage::Format_RGB32), renderImage(chart, QSize(800, 600)));
+}
+
+TEST(ExportFileTest, PdfStartsWithItsSignature)
+{
+    ChartControl chart;
+    sampleChart(chart);
+    QTemporaryDir dir = samples::scratchDir();
+    const QString path = dir.filePath(QStringLiteral("chart.pdf"));
+    exportChart(chart, path.toStdString(), QSize(800, 600));
+    EXPECT_TRUE(readAll(path).startsWith("%PDF"));
+}
+
+struct FailureCase {
+    const char* name;
+    const char* file;  // inside the scratch folder
+    QSize size;
+    int32_t number;
+    const char* named;  // part of the description
+};
+
+class ExportFailureTest : public ::testing::TestWithParam<FailureCase> {};
+
+TEST_P(ExportFailureTest, FailsWithoutLeavingAFile)
+{
+    ChartControl chart;
+    sampleChart(chart);
+    QTemporaryDir dir = samples::scratchDir();
+    QDir(dir.path()).mkdir(QStringLiteral("taken.png"));  // a folder where the file would go
+    QFile keep(dir.filePath(QStringLiteral("keep.png")));
+    ASSERT_TRUE(keep.open(QIODevice::WriteOnly));
+    keep.write("old");
+    keep.close();
+    const QStringList before = QDir(dir.path()).entryList(QDir::AllEntries | QDir::NoDotAndDotDot);
+
+    const std::string path = dir.filePath(QString::fromUtf8(GetParam().file)).toStdString();
+    try {
+        exportChart(chart, path, GetParam().size);
+        FAIL() << "no error";
+    } catch (const Error& e) {
+        EXPECT_EQ(e.number(), GetParam().number);
+        EXPECT_NE(e.description().find(GetParam().named), std::string::npos) << e.description();
+    }
+    EXPECT_EQ(QDir(dir.path()).entryList(QDir::AllEntries | QDir::NoDotAndDotDot), before);
+    EXPECT_EQ(readAll(dir.filePath(QStringLiteral("keep.png"))), QByteArray("old"));
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Failures, ExportFailureTest,
+    ::testing::Values(
+        FailureCase{"unknownExtension", "chart.bmp", {800, 600}, errc::InvalidProcedureCall, "\".bmp\""},
+        FailureCase{"noExtension", "chart", {800, 600}, errc::InvalidProcedureCall, "chart"},
+        FailureCase{
+            "missingFolder", "no/such/folder/chart.png", {800, 600}, errc::PathFileAccess, "no/such/folder/chart.png"},
+        FailureCase{"folderInTheWay", "taken.png", {800, 600}, errc::PathFileAccess, "taken.png"},
+        FailureCase{"badSizeKeepsTheOldFile", "keep.png", {0, 600}, errc::InvalidProcedureCall, "size"}),
+    [](const auto& info) { return std::string(info.param.name); });
+
+}  // namespace
+}  // namespace kg::control

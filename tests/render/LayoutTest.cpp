@@ -1,0 +1,367 @@
+// Geometry of the chart: where titles, legend and plot go, how the axes are annotated, the 3-D
+// offset and the mapping between data values and pixels.
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <cmath>
+#include <functional>
+
+#include "chart/control/render/ChartLayout.h"
+#include "chart/control/render/ChartText.h"
+#include "render/RenderSamples.h"
+
+namespace kg::control {
+namespace {
+
+const QRectF kTarget(0, 0, 800, 600);
+
+ChartControl& barChart(ChartControl& c, int series, int points)
+{
+    samples::styleLikeTheChartObject(c);
+    samples::fillTable(c, series, points, kBar);
+    samples::addSeriesLabels(c, series);
+    return c;
+}
+
+TEST(LayoutTest, HeaderAndFooterAreCentredAtTheEnds)
+{
+    ChartControl c;
+    barChart(c, 2, 3).footer.text = "Footer";
+    const ChartLayout L = computeLayout(c, kTarget);
+    EXPECT_NEAR(L.header.center().x(), 400, 0.5);
+    EXPECT_NEAR(L.footer.center().x(), 400, 0.5);
+    EXPECT_LT(L.header.bottom(), L.chartArea.top());
+    EXPECT_GT(L.footer.top(), L.chartArea.bottom());
+}
+
+TEST(LayoutTest, EmptyFooterTakesNoRoom)
+{
+    ChartControl c;
+    barChart(c, 2, 3);
+    const ChartLayout without = computeLayout(c, kTarget);
+    c.footer.text = "Footer";
+    const ChartLayout with = computeLayout(c, kTarget);
+    EXPECT_TRUE(without.footer.isEmpty());
+    EXPECT_GT(without.chartArea.bottom(), with.chartArea.bottom());
+}
+
+struct LegendCase {
+    const char* name;
+    int series;
+    bool shown;
+    bool expectLegend;
+};
+
+class LegendPlacementTest : public ::testing::TestWithParam<LegendCase> {};
+
+TEST_P(LegendPlacementTest, EastOfThePlotVerticallyCentredWithoutOverlaps)
+{
+    ChartControl c;
+    barChart(c, GetParam().series, 4).legend.isShown = GetParam().shown;
+    const ChartLayout L = computeLayout(c, kTarget);
+    ASSERT_EQ(!L.legend.isEmpty(), GetParam().expectLegend);
+    if (!GetParam().expectLegend) return;
+    EXPECT_GE(L.legend.left(), L.chartArea.right() + c.legend.layout1 - 0.5);
+    EXPECT_NEAR(L.legend.center().y(), L.chartArea.center().y(), 0.5);
+    EXPECT_LE(L.legend.right(), kTarget.right());
+    EXPECT_GE(L.legend.top(), L.chartArea.top() - 0.5);
+    const ChartFonts fonts(c);
+    for (size_t i = 0; i < L.legendItems.size(); ++i) {
+        const LegendItem& a = L.legendItems[i];
+        const QRectF ra(a.swatch.topLeft(), QPointF(a.textOrigin.x() + fonts.legend.width(a.text), a.swatch.bottom()));
+        EXPECT_TRUE(L.legend.contains(ra)) << i;
+        for (size_t j = i + 1; j < L.legendItems.size(); ++j) {
+            const LegendItem& b = L.legendItems[j];
+            const QRectF rb(b.swatch.topLeft(),
+                            QPointF(b.textOrigin.x() + fonts.legend.width(b.text), b.swatch.bottom()));
+            EXPECT_FALSE(ra.intersects(rb)) << i << " and " << j;
+        }
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(Legends, LegendPlacementTest,
+                         ::testing::Values(LegendCase{"tenSeries", 10, true, true},
+                                           LegendCase{"hidden", 10, false, false},
+                                           LegendCase{"oneSeries", 1, true, true},
+                                           LegendCase{"twoHundredSeries", 200, true, true}),
+                         [](const auto& info) { return std::string(info.param.name); });
+
+TEST(LayoutTest, LegendWithMoreEntriesThanRoomSaysSo)
+{
+    ChartControl c;
+    barChart(c, 600, 2);
+    const ChartLayout L = computeLayout(c, QRectF(0, 0, 400, 300));
+    EXPECT_TRUE(L.legendTruncated);
+    ASSERT_FALSE(L.legendItems.empty());
+    EXPECT_LT(L.legendItems.size(), size_t(600));
+    EXPECT_EQ(L.legendItems.back().text.toStdString(), "\u2026");
+}
+
+TEST(LayoutTest, LegendWithoutAnyTextIsLeftOut)
+{
+    ChartControl c;
+    samples::styleLikeTheChartObject(c);
+    samples::fillTable(c, 3, 4, kBar);
+    EXPECT_TRUE(computeLayout(c, kTarget).legend.isEmpty());
+}
+
+struct LegendTextCase {
+    const char* name;
+    int16_t chartType;
+    std::vector<std::string> seriesLabels, pointLabels;
+    std::vector<std::string> expected;
+};
+
+class LegendTextTest : public ::testing::TestWithParam<LegendTextCase> {};
+
+TEST_P(LegendTextTest, PicksTheListThatNamesTheEntries)
+{
+    ChartControl c;
+    samples::fillPie(c, {1, 2, 3});
+    c.group1.chartType = GetParam().chartType;
+    c.group1.seriesLabels = GetParam().seriesLabels;
+    c.group1.pointLabels = GetParam().pointLabels;
+    std::vector<std::string> got;
+    for (const QString& t : legendTexts(c, chartKindOf(c.group1.chartType))) got.push_back(t.toStdString());
+    EXPECT_EQ(got, GetParam().expected);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Texts, LegendTextTest,
+    ::testing::Values(LegendTextCase{"barSeriesLabels", kBar, {"a", "b", "c"}, {"x", "y", "z"}, {"a", "b", "c"}},
+                      LegendTextCase{"barIgnoresPointLabels", kBar, {}, {"x", "y", "z"}, {"", "", ""}},
+                      LegendTextCase{"pieSeriesLabels", kPie, {"a", "b", "c"}, {"x", "y", "z"}, {"a", "b", "c"}},
+                      LegendTextCase{"piePointLabelsWhenNoSeriesLabels", kPie, {}, {"x", "y", "z"}, {"x", "y", "z"}},
+                      LegendTextCase{"piePointLabelsCoverMore", kPie, {"Bookings"}, {"x", "y", "z"}, {"x", "y", "z"}},
+                      LegendTextCase{"pieMissingEntriesEmpty", kPie, {"a", "b"}, {}, {"a", "b", ""}},
+                      LegendTextCase{"leadingBlankKept", kBar, {" 5", "b", "c"}, {}, {" 5", "b", "c"}}),
+    [](const auto& info) { return std::string(info.param.name); });
+
+struct XLabelCase {
+    const char* name;
+    int points;
+    std::string stem;
+    QRectF target;
+    bool allShown;
+};
+
+class XLabelTest : public ::testing::TestWithParam<XLabelCase> {};
+
+// Texts along the X axis never overlap: side by side they keep apart, turned ones keep a line apart.
+TEST_P(XLabelTest, PointLabelsNeverOverlap)
+{
+    ChartControl c;
+    barChart(c, 10, GetParam().points);
+    samples::addPointLabels(c, GetParam().points, GetParam().stem);
+    const ChartLayout L = computeLayout(c, GetParam().target);
+    const ChartFonts fonts(c);
+    ASSERT_FALSE(L.xLabels.empty());
+    EXPECT_EQ(L.xLabels.size() == size_t(GetParam().points), GetParam().allShown);
+    for (size_t i = 1; i < L.xLabels.size(); ++i) {
+        const double gap = L.mapping.xPixel(L.xLabels[i].value) - L.mapping.xPixel(L.xLabels[i - 1].value);
+        if (L.xLabelsRotated) {
+            EXPECT_GE(gap * std::sqrt(0.5), fonts.tick.height * 0.8) << i;
+        } else {
+            const double halfWidths =
+                (fonts.tick.width(L.xLabels[i].text) + fonts.tick.width(L.xLabels[i - 1].text)) / 2;
+            EXPECT_GE(gap, halfWidths) << i;
+        }
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(Labels, XLabelTest,
+                         ::testing::Values(XLabelCase{"shortSideBySide", 12, "M", kTarget, true},
+                                           XLabelCase{"monthNames", 12, "September ", kTarget, true},
+                                           XLabelCase{"thousandPoints", 1000, "Hour ", QRectF(0, 0, 1600, 1000), false},
+                                           XLabelCase{"narrowWindow", 31, "Day ", QRectF(0, 0, 300, 240), false}),
+                         [](const auto& info) { return std::string(info.param.name); });
+
+TEST(LayoutTest, NumberedXAxisShowsWholePointNumbers)
+{
+    ChartControl c;
+    barChart(c, 3, 12).chartArea.x.annotationMethod = 0;
+    const ChartLayout L = computeLayout(c, kTarget);
+    ASSERT_FALSE(L.xLabels.empty());
+    for (const AxisLabel& a : L.xLabels) {
+        EXPECT_EQ(a.value, std::floor(a.value));
+        EXPECT_EQ(a.text.toDouble(), a.value);
+    }
+}
+
+TEST(LayoutTest, YTicksAreRoundAndCoverTheData)
+{
+    ChartControl c;
+    barChart(c, 3, 5);
+    c.data().setY(2, 3, 173.4);
+    const ChartLayout L = computeLayout(c, kTarget);
+    EXPECT_LE(L.yScale.min, 0);
+    EXPECT_GE(L.yScale.max, 173.4);
+    EXPECT_GE(L.yLabels.size(), size_t(5));
+    EXPECT_LE(L.yLabels.size(), size_t(12));
+    const double mantissa = L.yScale.step / std::pow(10.0, std::floor(std::log10(L.yScale.step)));
+    EXPECT_TRUE(mantissa == 1 || mantissa == 2 || mantissa == 2.5 || mantissa == 5) << mantissa;
+}
+
+TEST(LayoutTest, AxisZoomSetsTheRange)
+{
+    ChartControl c;
+    barChart(c, 3, 5);
+    c.chartArea.y.hasFixedRange = true;
+    c.chartArea.y.min = 20;
+    c.chartArea.y.max = 60;
+    const ChartLayout L = computeLayout(c, kTarget);
+    EXPECT_EQ(L.mapping.yMin, 20);
+    EXPECT_EQ(L.mapping.yMax, 60);
+    for (const AxisLabel& a : L.yLabels) {
+        EXPECT_GE(a.value, 20);
+        EXPECT_LE(a.value, 60);
+    }
+}
+
+TEST(LayoutTest, ValueLabelsGetRoomAboveTheHighestBar)
+{
+    ChartControl c;
+    barChart(c, 1, 3);
+    c.data().setY(1, 2, 97);  // just below a round top of 100
+    const double without = computeLayout(c, kTarget).mapping.yMax;
+    samples::addValueLabel(c, 1, 2, " 97");
+    const ChartLayout L = computeLayout(c, kTarget);
+    EXPECT_GT(L.mapping.yMax, without);
+    EXPECT_GE(L.mapping.yPixel(97) - L.plotArea.top(), 20 + ChartFonts(c).label.height);
+}
+
+struct DepthCase {
+    const char* name;
+    View3D view;
+    bool flat;
+};
+
+class DepthTest : public ::testing::TestWithParam<DepthCase> {};
+
+TEST_P(DepthTest, FlatWhenDepthOrBothAnglesAreZero)
+{
+    ChartControl c;
+    barChart(c, 3, 12).chartArea.view3D = GetParam().view;
+    const ChartLayout L = computeLayout(c, kTarget);
+    EXPECT_EQ(L.depth.isNull(), GetParam().flat);
+    // The back plane stays inside the chart area.
+    EXPECT_TRUE(L.chartContent.contains(L.plotArea.translated(L.depth)));
+}
+
+INSTANTIATE_TEST_SUITE_P(Views, DepthTest,
+                         ::testing::Values(DepthCase{"noDepth", {10, 10, 0}, true},
+                                           DepthCase{"noAngles", {0, 0, 30}, true},
+                                           DepthCase{"defaults", {10, 10, 10}, false},
+                                           DepthCase{"rotationOnly", {20, 0, 10}, false},
+                                           DepthCase{"elevationOnly", {0, 20, 10}, false},
+                                           DepthCase{"negativeAngles", {-20, -20, 60}, false}),
+                         [](const auto& info) { return std::string(info.param.name); });
+
+struct PieCase {
+    const char* name;
+    std::vector<double> values;
+    std::vector<int32_t> slices;
+};
+
+class PieSliceTest : public ::testing::TestWithParam<PieCase> {};
+
+TEST_P(PieSliceTest, PositiveValuesShareTheCircle)
+{
+    ChartControl c;
+    samples::fillPie(c, GetParam().values);
+    const ChartLayout L = computeLayout(c, kTarget);
+    std::vector<int32_t> series;
+    double total = 0;
+    for (const PieSlice& s : L.pie.slices) {
+        series.push_back(s.series);
+        total += s.spanAngle;
+    }
+    EXPECT_EQ(series, GetParam().slices);
+    if (!series.empty()) {
+        EXPECT_NEAR(total, -360, 1e-9);
+        EXPECT_NEAR(L.pie.slices.front().startAngle, 90, 1e-9);  // the first slice starts at the top
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(Pies, PieSliceTest,
+                         ::testing::Values(PieCase{"allPositive", {1, 2, 3}, {1, 2, 3}},
+                                           PieCase{"zeroSkipped", {1, 0, 3}, {1, 3}},
+                                           PieCase{"negativeSkipped", {-1, 2, 3}, {2, 3}},
+                                           PieCase{"nothingPositive", {0, -2}, {}}, PieCase{"none", {}, {}}),
+                         [](const auto& info) { return std::string(info.param.name); });
+
+TEST(LayoutTest, PieIsTiltedAndHasARimIn3D)
+{
+    ChartControl c;
+    samples::fillPie(c, {1, 2, 3});
+    const ChartLayout flat = computeLayout(c, kTarget);
+    EXPECT_EQ(flat.pie.rx, flat.pie.ry);
+    EXPECT_EQ(flat.pie.rim, 0);
+    c.chartArea.view3D = {0, 45, 20};
+    const ChartLayout tilted = computeLayout(c, kTarget);
+    EXPECT_LT(tilted.pie.ry, tilted.pie.rx * 0.75);
+    EXPECT_GT(tilted.pie.rim, 0);
+}
+
+struct ViewCase {
+    const char* name;
+    ViewState view;
+};
+
+class ViewMappingTest : public ::testing::TestWithParam<ViewCase> {};
+
+TEST_P(ViewMappingTest, DataValuesRoundTripThroughScreenPositions)
+{
+    ChartControl c;
+    barChart(c, 3, 12).view = GetParam().view;
+    const ChartLayout L = computeLayout(c, kTarget);
+    for (const QPointF& v : {QPointF(1, 0), QPointF(6.5, 42), QPointF(12, 88.25)}) {
+        QPointF back;
+        ASSERT_TRUE(L.toValue(L.toScreen(v.x(), v.y()), back));
+        EXPECT_NEAR(back.x(), v.x(), 1e-9);
+        EXPECT_NEAR(back.y(), v.y(), 1e-9);
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(Views, ViewMappingTest,
+                         ::testing::Values(ViewCase{"identity", {}}, ViewCase{"scaled", {2, 0, 0}},
+                                           ViewCase{"moved", {1, 0.25, -0.1}},
+                                           ViewCase{"scaledAndMoved", {0.5, -0.2, 0.3}}),
+                         [](const auto& info) { return std::string(info.param.name); });
+
+TEST(LayoutTest, ViewStateMovesOnlyTheChartAreaContent)
+{
+    ChartControl c;
+    barChart(c, 3, 12);
+    const ChartLayout plain = computeLayout(c, kTarget);
+    c.view = {2, 0.1, 0.1};
+    const ChartLayout zoomed = computeLayout(c, kTarget);
+    EXPECT_EQ(zoomed.header, plain.header);
+    EXPECT_EQ(zoomed.legend, plain.legend);
+    EXPECT_EQ(zoomed.chartArea, plain.chartArea);
+    const QPointF centre = plain.chartContent.center();
+    // Scaled about the centre of the chart area, then moved by a tenth of its size.
+    EXPECT_NEAR(zoomed.view.map(centre).x(), centre.x() + 0.1 * plain.chartContent.width(), 1e-9);
+    EXPECT_NEAR(zoomed.toScreen(1, 0).x() - zoomed.view.map(centre).x(), 2 * (plain.toScreen(1, 0).x() - centre.x()),
+                1e-9);
+}
+
+struct KindCase {
+    const char* name;
+    int16_t code;
+    ChartKind kind;
+};
+
+class ChartKindTest : public ::testing::TestWithParam<KindCase> {};
+
+TEST_P(ChartKindTest, UnknownCodesDrawAsBars) { EXPECT_EQ(chartKindOf(GetParam().code), GetParam().kind); }
+
+INSTANTIATE_TEST_SUITE_P(Codes, ChartKindTest,
+                         ::testing::Values(KindCase{"plot", 1, ChartKind::Plot}, KindCase{"bar", 2, ChartKind::Bar},
+                                           KindCase{"pie", 3, ChartKind::Pie}, KindCase{"area", 5, ChartKind::Area},
+                                           KindCase{"notSet", 0, ChartKind::Bar}, KindCase{"four", 4, ChartKind::Bar},
+                                           KindCase{"negative", -1, ChartKind::Bar}),
+                         [](const auto& info) { return std::string(info.param.name); });
+
+}  // namespace
+}  // namespace kg::control

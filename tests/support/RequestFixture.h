@@ -1,0 +1,89 @@
+#pragma once
+// End-to-end request tests: a cTavixGraph driven through its dispatch ids, the test stand's host
+// objects on a temporary settings file, a form from JSON text, and the headless UI that records
+// message boxes and answers the data choice dialogs.
+#include <gtest/gtest.h>
+
+#include <QDir>
+#include <QTemporaryDir>
+#include <string>
+
+#include "component/HeadlessUi.h"
+#include "component/cTavixGraph.h"
+#include "component/modMain.h"
+#include "core/Error.h"
+#include "host/TestStand.h"
+
+namespace kg::test {
+
+struct RequestFixture : ::testing::Test {
+    QTemporaryDir dir;
+    Ref<cTavixGraph> graph = makeRef<cTavixGraph>();
+    HeadlessUi* ui = nullptr;
+
+    void SetUp() override
+    {
+        auto headless = std::make_unique<HeadlessUi>();
+        ui = headless.get();
+        setUiServices(std::move(headless));
+        auto& cfg = host::teststand::config();
+        cfg = {};
+        cfg.settingsFile = dir.filePath("settings.ini").toStdString();
+        cfg.appFolder = dir.path().toStdString();
+        modMain::releaseSharedObjects();
+        modMain::gvSourceForm = Variant();
+        modMain::giChartKind = 0;
+    }
+    void TearDown() override
+    {
+        modMain::releaseSharedObjects();
+        modMain::gvSourceForm = Variant();
+        setUiServices(nullptr);
+    }
+
+    void writeSetting(const std::string& key, const std::string& value)
+    {
+        Args a{Variant("2dCharts"), Variant(key), Variant(value), Variant("Tavix"), Variant(std::string())};
+        Ref<Object> settings = host::hostObjectFactory()->create(host::HostClass::Settings);
+        call(Variant(settings), "WriteSetting", a);
+    }
+    void setForm(const std::string& json)
+    {
+        Args a{Variant(host::teststand::loadFormJson(json, "test form"))};
+        graph->invoke(0x68030008, kPropertyPut, a);
+    }
+    // Invokes by dispatch id; returns the error number (0 on success).
+    int32_t request(DispId id, Args args = {})
+    {
+        try {
+            graph->invoke(id, kMethod, args);
+            return 0;
+        } catch (const Error& e) {
+            lastError = e.description();
+            return e.number();
+        }
+    }
+    control::ChartControl& chart1() { return modMain::gfChart->Chart1(); }
+    std::string lastError;
+};
+
+// A grid as JSON: `fixedRows` caption rows, then data rows "Row k" with values k*10 + column.
+inline std::string gridJson(int fixedRows, int dataRows, int cols)
+{
+    std::string s = "{\"fixedRows\": " + std::to_string(fixedRows) + ", \"cells\": [";
+    for (int r = 0; r < fixedRows + dataRows; ++r) {
+        s += r ? ", [" : "[";
+        for (int c = 0; c < cols; ++c) {
+            std::string cell;
+            if (r < fixedRows)
+                cell = "\"" + (c == 0 ? std::string("") : r == 0 ? "C" + std::to_string(c) : "sub") + "\"";
+            else
+                cell = c == 0 ? "\"Row " + std::to_string(r - fixedRows + 1) + "\"" : std::to_string((r - fixedRows + 1) * 10 + c);
+            s += (c ? ", " : "") + cell;
+        }
+        s += "]";
+    }
+    return s + "]}";
+}
+
+}  // namespace kg::test

@@ -1,0 +1,164 @@
+// "Advanced Chart Help": the help file's path from the application folder, the opener, and the
+// shell-style codes that reach ReportShellError.
+#include <QDeadlineTimer>
+#include <QDir>
+#include <QFile>
+#include <QThread>
+
+#include "ui/AdvancedHelp.h"
+#include "ui/UiFixture.h"
+
+namespace kg::test {
+namespace {
+
+struct AdvancedHelpFixture : UiFixture {
+    std::vector<int32_t> reported;
+
+    void SetUp() override
+    {
+        UiFixture::SetUp();
+        host::teststand::setShellErrorReporter([this](int32_t code, const std::string&) { reported.push_back(code); });
+    }
+    void TearDown() override
+    {
+        ui::setHelpOpener({});
+        host::teststand::setShellErrorReporter({});
+        UiFixture::TearDown();
+    }
+    // Puts a help file into the application folder (the fixture's temporary folder).
+    std::string writeHelpFile()
+    {
+        QDir(dir.path()).mkpath("Help");
+        const QString path = dir.filePath("Help/chartctl.hlp");
+        QFile f(path);
+        EXPECT_TRUE(f.open(QIODevice::WriteOnly));
+        f.write("help\n");
+        return path.toStdString();
+    }
+    std::string expectedPath() const { return dir.path().toStdString() + "/Help/chartctl.hlp"; }
+};
+
+TEST_F(AdvancedHelpFixture, MissingFileReportsCode2)
+{
+    ui::setHelpOpener({});  // the desktop's opener
+    ui::openAdvancedHelp();
+    EXPECT_EQ(reported, std::vector<int32_t>{2});
+    EXPECT_EQ(host::teststand::lastShellError(), 2);
+}
+
+struct CodeCase {
+    const char* name;
+    int openerResult;
+    std::vector<int32_t> reported;
+};
+void PrintTo(const CodeCase& c, std::ostream* os) { *os << c.name; }
+
+const CodeCase kCodes[] = {
+    {"Zero", 0, {0}},
+    {"FileNotFound", 2, {2}},
+    {"NoAssociation", 31, {31}},
+    {"ThirtyTwoIsSuccess", 32, {}},
+    {"Started", 42, {}},
+};
+
+struct Code : AdvancedHelpFixture, ::testing::WithParamInterface<CodeCase> {};
+
+TEST_P(Code, OnlyCodesBelow32AreReported)
+{
+    std::vector<std::string> opened;
+    ui::setHelpOpener([&](const std::string& path) {
+        opened.push_back(path);
+        return GetParam().openerResult;
+    });
+    ui::openAdvancedHelp();
+    EXPECT_EQ(opened, std::vector<std::string>{expectedPath()});
+    EXPECT_EQ(reported, GetParam().reported);
+}
+
+INSTANTIATE_TEST_SUITE_P(AdvancedHelp, Code, ::testing::ValuesIn(kCodes),
+                         [](const auto& info) { return std::string(info.param.name); });
+
+TEST_F(AdvancedHelpFixture, PathIsTheApplicationFolderAsTheHostGivesIt)
+{
+    host::teststand::config().appFolder = "/opt/Tavix App";
+    modMain::GraphInitialize();
+    std::string opened;
+    ui::setHelpOpener([&](const std::string& path) {
+        opened = path;
+        return ui::kShellOk;
+    });
+    ui::openAdvancedHelp();
+    EXPECT_EQ(opened, "/opt/Tavix App/Help/chartctl.hlp");
+    EXPECT_TRUE(reported.empty());
+}
+
+struct OpenerCase {
+    const char* name;
+    bool fileThere;
+    const char* program;
+    int expected;
+};
+void PrintTo(const OpenerCase& c, std::ostream* os) { *os << c.name; }
+
+const OpenerCase kOpeners[] = {
+    {"FileMissing", false, "true", ui::kShellFileNotFound},
+    {"OpenerNotOnPath", true, "kg-no-such-opener-program", ui::kShellNoAssociation},
+    {"OpenerStarts", true, "true", ui::kShellOk},
+};
+
+struct DesktopOpener : AdvancedHelpFixture, ::testing::WithParamInterface<OpenerCase> {};
+
+TEST_P(DesktopOpener, GivesShellStyleCodes)
+{
+    const std::string path = GetParam().fileThere ? writeHelpFile() : expectedPath();
+    EXPECT_EQ(ui::desktopOpener(GetParam().program)(path), GetParam().expected);
+    ui::setHelpOpener(ui::desktopOpener(GetParam().program));
+    ui::openAdvancedHelp();
+    if (GetParam().expected < 32)
+        EXPECT_EQ(reported, std::vector<int32_t>{GetParam().expected});
+    else
+        EXPECT_TRUE(reported.empty());
+}
+
+INSTANTIATE_TEST_SUITE_P(AdvancedHelp, DesktopOpener, ::testing::ValuesIn(kOpeners),
+                         [](const auto& info) { return std::string(info.param.name); });
+
+TEST_F(AdvancedHelpFixture, OpenerGetsThePathAsOneArgumentWithoutAShell)
+{
+    // An application folder whose name a shell would split and expand.
+    const QString folder = dir.filePath("Tavix $HOME 'x' ; y");
+    QDir().mkpath(folder + "/Help");
+    QFile help(folder + "/Help/chartctl.hlp");
+    ASSERT_TRUE(help.open(QIODevice::WriteOnly));
+    help.close();
+    host::teststand::config().appFolder = folder.toStdString();
+    modMain::GraphInitialize();
+
+    // A stand-in opener that writes down its arguments.
+    const QString record = dir.filePath("args.txt");
+    const QString opener = dir.filePath("record-args");
+    QFile script(opener);
+    ASSERT_TRUE(script.open(QIODevice::WriteOnly));
+    script.write(("#!/bin/sh\nprintf '%s\\n' \"$#\" \"$1\" > '" + record + ".part'\nmv '" + record + ".part' '" +
+                  record + "'\n")
+                     .toUtf8());
+    script.close();
+    script.setPermissions(QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
+
+    ui::setHelpOpener(ui::desktopOpener(opener.toStdString()));
+    ui::openAdvancedHelp();
+    EXPECT_TRUE(reported.empty());
+
+    // The opener runs detached; wait for what it wrote.
+    QDeadlineTimer deadline(10000);
+    while (!QFile::exists(record) && !deadline.hasExpired()) QThread::msleep(20);
+    QFile out(record);
+    ASSERT_TRUE(out.open(QIODevice::ReadOnly)) << "the opener did not run";
+    const QStringList lines = QString::fromUtf8(out.readAll()).split('\n');
+    ASSERT_GE(lines.size(), 2);
+    EXPECT_EQ(lines[0], "1");
+    EXPECT_EQ(lines[1], folder + "/Help/chartctl.hlp");
+}
+
+}  // namespace
+}  // namespace kg::test

@@ -1,0 +1,51 @@
+#pragma once
+// Window tests: the test stand's host objects on a temporary settings file (RequestFixture),
+// GraphInitialize run directly, a chart object bound to the headless window's control, and a
+// scripted prompter that answers the modal dialogs.
+#include <optional>
+#include <string>
+
+#include "host/FaultPlan.h"
+#include "host/SettingsFile.h"
+#include "support/RequestFixture.h"
+#include "ui/Prompter.h"
+
+namespace kg::test {
+
+struct UiFixture : RequestFixture {
+    ui::ScriptedPrompter* prompts = nullptr;
+
+    void SetUp() override
+    {
+        RequestFixture::SetUp();
+        auto scripted = std::make_unique<ui::ScriptedPrompter>();
+        prompts = scripted.get();
+        ui::setPrompter(std::move(scripted));
+        modMain::GraphInitialize();
+        modMain::chart().Initialize(&modMain::chartWindow().Chart1(), "Header", "", "", "");
+    }
+    void TearDown() override
+    {
+        host::teststand::FaultPlan::clear();
+        ui::setPrompter(std::make_unique<ui::QtPrompter>());
+        RequestFixture::TearDown();
+    }
+
+    // What the settings file holds for a key of the chart style, read from disk; nothing when
+    // the key was never written.
+    std::optional<std::string> storedStyle(const std::string& key) const
+    {
+        return settingsFile().read("Tavix/2dCharts/" + key);
+    }
+    // A window placement value, "FormState/<window key>/<member>".
+    std::optional<std::string> storedPlacement(const std::string& windowKey, const std::string& member) const
+    {
+        return settingsFile().read("FormState/" + windowKey + "/" + member);
+    }
+    host::teststand::SettingsFile settingsFile() const
+    {
+        return host::teststand::SettingsFile(host::teststand::config().settingsFile);
+    }
+};
+
+}  // namespace kg::test

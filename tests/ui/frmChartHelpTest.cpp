@@ -1,0 +1,279 @@
+// The help text window: its document, its size following, one instance, and its placement kept
+// under "ChartHelp".
+#include <QCoreApplication>
+#include <QFile>
+#include <QTextBlock>
+#include <QTextBrowser>
+#include <QTextDocument>
+#include <QTextList>
+
+#include "ui/HelpText.h"
+#include "ui/frmChartHelp.h"
+#include "ui/UiFixture.h"
+
+namespace kg::test {
+namespace {
+
+using ui::chartHelpWindow;
+using ui::frmChartHelp;
+using ui::showChartHelp;
+
+struct HelpFixture : UiFixture {
+    QString eventLog;
+
+    void SetUp() override
+    {
+        UiFixture::SetUp();
+        eventLog = dir.filePath("events.log");
+        host::teststand::config().eventLogFile = eventLog.toStdString();
+        modMain::GraphInitialize();  // application services that write the event log
+    }
+    void TearDown() override
+    {
+        closeHelp();
+        UiFixture::TearDown();
+    }
+    // Closes the window as the title bar does and lets Qt delete it.
+    static void closeHelp()
+    {
+        if (frmChartHelp* w = chartHelpWindow()) w->close();
+        QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    }
+    // "FormLoad frmChartHelp" and the like, in order, without the time stamps.
+    std::vector<std::string> events() const
+    {
+        std::vector<std::string> lines;
+        QFile f(eventLog);
+        if (!f.open(QIODevice::ReadOnly)) return lines;
+        for (const QByteArray& line : f.readAll().split('\n'))
+            if (!line.isEmpty()) lines.push_back(line.mid(line.indexOf(' ') + 1).toStdString());
+        return lines;
+    }
+};
+
+// ---- The document ------------------------------------------------------------------------------
+
+struct BlockInfo {
+    QString text;
+    bool bold = true;         // every fragment bold
+    bool arial8 = true;       // every fragment Arial 8 point
+    bool numbered = false;    // an item of a decimal list
+};
+
+std::vector<BlockInfo> blocksOf(const QTextDocument& doc)
+{
+    std::vector<BlockInfo> blocks;
+    for (QTextBlock b = doc.begin(); b != doc.end(); b = b.next()) {
+        BlockInfo info;
+        info.text = b.text();
+        for (auto it = b.begin(); !it.atEnd(); ++it) {
+            const QTextCharFormat f = it.fragment().charFormat();
+            info.bold = info.bold && f.fontWeight() == QFont::Bold;
+            info.arial8 = info.arial8 && f.fontFamilies().toStringList() == QStringList{"Arial"} &&
+                          f.fontPointSize() == 8;
+        }
+        info.numbered = b.textList() && b.textList()->format().style() == QTextListFormat::ListDecimal;
+        blocks.push_back(info);
+    }
+    return blocks;
+}
+
+const char* const kHeadings[] = {
+    "To Scale the Chart:",
+    "To Move the Chart:",
+    "To Graphics Zoom an Area of the Chart:",
+    "To Axis Zoom the Chart:",
+    "To Rotate the Chart (Bar/Pie charts displaying 3D effect only):",
+    "To Reset to Automatic Scale and Position:",
+};
+
+TEST(HelpText, EveryFragmentIsArial8Point)
+{
+    QTextDocument doc;
+    ui::buildChartHelp(doc);
+    const std::vector<BlockInfo> blocks = blocksOf(doc);
+    ASSERT_GT(blocks.size(), 20u);
+    for (const BlockInfo& b : blocks) EXPECT_TRUE(b.arial8) << b.text.toStdString();
+    EXPECT_EQ(doc.defaultFont().family(), "Arial");
+    EXPECT_EQ(doc.defaultFont().pointSize(), 8);
+}
+
+TEST(HelpText, OpensWithTheBoldTitleThenTwoParagraphsThenSpecialNotes)
+{
+    QTextDocument doc;
+    ui::buildChartHelp(doc);
+    const std::vector<BlockInfo> blocks = blocksOf(doc);
+    ASSERT_GE(blocks.size(), 6u);
+    EXPECT_EQ(blocks[0].text, "Interacting with the Chart");
+    EXPECT_TRUE(blocks[0].bold);
+    EXPECT_FALSE(blocks[1].bold);
+    EXPECT_TRUE(blocks[1].text.contains("chart area") && blocks[1].text.contains("header"));
+    EXPECT_TRUE(blocks[1].text.contains("series") && blocks[1].text.contains("value"));  // the tooltip
+    EXPECT_FALSE(blocks[2].bold);
+    EXPECT_TRUE(blocks[2].text.contains("Graphics zoom") && blocks[2].text.contains("Axis zoom"));
+    EXPECT_EQ(blocks[3].text, "Special Notes");
+    EXPECT_TRUE(blocks[3].bold);
+    // Two notes, then the first interaction heading.
+    EXPECT_FALSE(blocks[4].bold);
+    EXPECT_TRUE(blocks[4].text.contains("programmer"));
+    EXPECT_FALSE(blocks[5].bold);
+    EXPECT_TRUE(blocks[5].text.contains("margins"));
+    EXPECT_EQ(blocks[6].text, kHeadings[0]);
+}
+
+TEST(HelpText, EachHeadingIsBoldInOrderAndFollowedByNumberedSteps)
+{
+    QTextDocument doc;
+    ui::buildChartHelp(doc);
+    const std::vector<BlockInfo> blocks = blocksOf(doc);
+    size_t from = 0;
+    for (const char* heading : kHeadings) {
+        auto it = std::find_if(blocks.begin() + long(from), blocks.end(),
+                               [&](const BlockInfo& b) { return b.text == heading; });
+        ASSERT_NE(it, blocks.end()) << heading << " missing or out of order";
+        EXPECT_TRUE(it->bold) << heading;
+        EXPECT_FALSE(it->numbered) << heading;
+        size_t steps = 0;
+        for (auto s = it + 1; s != blocks.end() && s->numbered; ++s) {
+            EXPECT_FALSE(s->bold) << s->text.toStdString();
+            ++steps;
+        }
+        EXPECT_GE(steps, 2u) << heading;
+        from = size_t(it - blocks.begin()) + 1 + steps;
+    }
+    EXPECT_EQ(from, blocks.size());  // the last heading's steps end the document
+}
+
+struct GestureCase {
+    const char* heading;
+    std::vector<const char*> words;  // each must appear in the steps under the heading
+};
+
+const GestureCase kGestures[] = {
+    {"To Scale the Chart:", {"Ctrl", "both mouse buttons", "middle button", "down", "enlarge", "up", "shrink", "wheel"}},
+    {"To Move the Chart:", {"Shift", "both mouse buttons", "middle button", "Move the mouse"}},
+    {"To Graphics Zoom an Area of the Chart:", {"Ctrl", "left mouse button", "Drag", "Release", "Escape"}},
+    {"To Axis Zoom the Chart:", {"Shift", "left mouse button", "Drag", "Release", "minimum and maximum", "tick", "Escape"}},
+    {"To Rotate the Chart (Bar/Pie charts displaying 3D effect only):",
+     {"both mouse buttons", "middle button", "without", "up or down", "elevation", "bar charts", "left or right",
+      "rotation", "-45 to 45"}},
+    {"To Reset to Automatic Scale and Position:", {"\"r\"", "margins"}},
+};
+
+TEST(HelpText, StepsDescribeTheControlsGestures)
+{
+    QTextDocument doc;
+    ui::buildChartHelp(doc);
+    const std::vector<BlockInfo> blocks = blocksOf(doc);
+    for (const GestureCase& g : kGestures) {
+        auto it = std::find_if(blocks.begin(), blocks.end(), [&](const BlockInfo& b) { return b.text == g.heading; });
+        ASSERT_NE(it, blocks.end()) << g.heading;
+        QString steps;
+        for (auto s = it + 1; s != blocks.end() && s->numbered; ++s) steps += s->text + "\n";
+        for (const char* word : g.words) EXPECT_TRUE(steps.contains(word)) << g.heading << ": " << word;
+    }
+}
+
+// ---- The window --------------------------------------------------------------------------------
+
+TEST_F(HelpFixture, OpensAsDesignedAndReportsItsLoad)
+{
+    showChartHelp();
+    frmChartHelp* w = chartHelpWindow();
+    ASSERT_NE(w, nullptr);
+    EXPECT_EQ(w->objectName(), "frmChartHelp");
+    EXPECT_EQ(w->windowTitle(), "Chart Mouse and Keyboard Functions");
+    EXPECT_TRUE(w->isVisible());
+    EXPECT_FALSE(w->isModal());
+    EXPECT_EQ(w->parentWidget(), nullptr);
+    EXPECT_EQ(w->size(), QSize(656, 353));  // 9852 x 5304 twips
+    EXPECT_EQ(w->Text1->objectName(), "Text1");
+    EXPECT_TRUE(w->Text1->isReadOnly());
+    EXPECT_EQ(w->Text1->geometry(), QRect(0, 0, 656, 353));
+    EXPECT_TRUE(w->Text1->toPlainText().startsWith("Interacting with the Chart"));
+    EXPECT_EQ(events(), std::vector<std::string>{"FormLoad frmChartHelp"});
+}
+
+struct ResizeCase {
+    const char* name;
+    QSize size;
+};
+void PrintTo(const ResizeCase& c, std::ostream* os) { *os << c.name; }
+
+const ResizeCase kResizes[] = {{"Larger", {900, 600}}, {"Smaller", {200, 120}}, {"Wide", {800, 100}}};
+
+struct Resize : HelpFixture, ::testing::WithParamInterface<ResizeCase> {};
+
+TEST_P(Resize, TextFillsTheWindow)
+{
+    showChartHelp();
+    frmChartHelp* w = chartHelpWindow();
+    w->resize(GetParam().size);
+    QCoreApplication::processEvents();
+    EXPECT_EQ(w->Text1->geometry(), QRect(QPoint(0, 0), w->size()));
+    EXPECT_EQ(w->size(), GetParam().size);
+}
+
+INSTANTIATE_TEST_SUITE_P(ChartHelp, Resize, ::testing::ValuesIn(kResizes),
+                         [](const auto& info) { return std::string(info.param.name); });
+
+TEST_F(HelpFixture, SecondShowReusesTheWindow)
+{
+    showChartHelp();
+    frmChartHelp* first = chartHelpWindow();
+    first->hide();
+    showChartHelp();
+    EXPECT_EQ(chartHelpWindow(), first);
+    EXPECT_TRUE(first->isVisible());
+    EXPECT_EQ(events(), std::vector<std::string>{"FormLoad frmChartHelp"});  // loaded once
+}
+
+TEST_F(HelpFixture, ClosingSavesThePlacementUnderChartHelpAndTheNextOneRestoresIt)
+{
+    showChartHelp();
+    chartHelpWindow()->resize(500, 300);
+    QCoreApplication::processEvents();
+    closeHelp();
+    EXPECT_EQ(chartHelpWindow(), nullptr);
+    EXPECT_EQ(storedPlacement("ChartHelp", "Width"), "7500");
+    EXPECT_EQ(storedPlacement("ChartHelp", "Height"), "4500");
+    EXPECT_EQ(storedPlacement("ChartHelp", "WindowState"), "0");
+    EXPECT_EQ(storedPlacement("Chart", "Width"), std::nullopt);
+
+    showChartHelp();
+    ASSERT_NE(chartHelpWindow(), nullptr);
+    EXPECT_EQ(chartHelpWindow()->size(), QSize(500, 300));
+    EXPECT_EQ(chartHelpWindow()->Text1->size(), QSize(500, 300));
+    EXPECT_EQ(events(), (std::vector<std::string>{"FormLoad frmChartHelp", "FormQueryUnload frmChartHelp",
+                                                  "FormLoad frmChartHelp"}));
+}
+
+TEST_F(HelpFixture, ClosingAfterTheChartWindowReleasedTheHostObjectsIsQuiet)
+{
+    showChartHelp();
+    modMain::releaseSharedObjects();
+    closeHelp();
+    EXPECT_EQ(chartHelpWindow(), nullptr);
+    EXPECT_TRUE(prompts->messages.empty());
+    EXPECT_EQ(storedPlacement("ChartHelp", "Width"), std::nullopt);
+}
+
+TEST_F(HelpFixture, FailingSaveIsReportedAndTheWindowStillCloses)
+{
+    showChartHelp();
+    host::teststand::FaultPlan::failOn("AppServices.SaveFormState", 1);
+    closeHelp();
+    EXPECT_EQ(chartHelpWindow(), nullptr);
+    ASSERT_EQ(prompts->messages.size(), 1u);
+    EXPECT_NE(prompts->messages[0].find("SaveFormState"), std::string::npos) << prompts->messages[0];
+}
+
+TEST_F(HelpFixture, FailingLoadLeavesNoWindow)
+{
+    host::teststand::FaultPlan::failOn("AppServices.RestoreFormState", 1);
+    EXPECT_THROW(showChartHelp(), Error);
+    EXPECT_EQ(chartHelpWindow(), nullptr);
+}
+
+}  // namespace
+}  // namespace kg::test
