@@ -22,53 +22,77 @@ const char* typeName(VarType t)
     return "Unknown";
 }
 
-Variant::Variant(Ref<Object> o) : v_(std::move(o)) {}
-Variant::Variant(Object* o) : v_(Ref<Object>(o)) {}
-Variant::Variant(VariantArray a) : v_(ArrayBox{std::make_unique<VariantArray>(std::move(a))}) {}
-Variant::~Variant() = default;
+Variant::Variant(std::string s) : type_(VarType::String) { u_.s = new std::string(std::move(s)); }
+Variant::Variant(const char* s) : type_(VarType::String) { u_.s = new std::string(s); }
+Variant::Variant(Ref<Object> o) : type_(VarType::Object)
+{
+    u_.o = o.get();
+    if (u_.o) u_.o->addRef();
+}
+Variant::Variant(Object* o) : Variant(Ref<Object>(o)) {}
+Variant::Variant(VariantArray a) : type_(VarType::Array) { u_.a = new VariantArray(std::move(a)); }
 
 Variant Variant::null()
 {
     Variant v;
-    v.v_ = NullBox{};
+    v.type_ = VarType::Null;
     return v;
 }
 
 Variant Variant::date(double serial)
 {
-    Variant v;
-    v.v_ = DateBox{serial};
+    Variant v(serial);
+    v.type_ = VarType::Date;
     return v;
 }
 
-Variant::Variant(const Variant& o)
+void Variant::release() noexcept
 {
-    if (auto* box = std::get_if<ArrayBox>(&o.v_))
-        v_ = ArrayBox{std::make_unique<VariantArray>(*box->a)};  // arrays are values: copied
-    else
-        std::visit(
-            [this](const auto& x) {
-                using T = std::decay_t<decltype(x)>;
-                if constexpr (!std::is_same_v<T, ArrayBox>) v_ = x;
-            },
-            o.v_);
+    switch (type_) {
+    case VarType::String: delete u_.s; break;
+    case VarType::Object:
+        if (u_.o) u_.o->release();
+        break;
+    case VarType::Array: delete u_.a; break;
+    default: break;
+    }
+    type_ = VarType::Empty;
 }
+
+void Variant::copyFrom(const Variant& o)
+{
+    switch (o.type_) {
+    case VarType::String: u_.s = new std::string(*o.u_.s); break;
+    case VarType::Object:
+        u_.o = o.u_.o;
+        if (u_.o) u_.o->addRef();
+        break;
+    case VarType::Array: u_.a = new VariantArray(*o.u_.a); break;  // arrays are values: copied
+    default: u_ = o.u_; break;
+    }
+    type_ = o.type_;
+}
+
+Variant::Variant(const Variant& o) { copyFrom(o); }
 
 Variant& Variant::operator=(const Variant& o)
 {
     if (this != &o) {
-        Variant copy(o);
+        Variant copy(o);  // before releasing: `o` may live inside what this value holds
         *this = std::move(copy);
     }
     return *this;
 }
 
-VarType Variant::type() const
+Variant& Variant::operator=(Variant&& o) noexcept
 {
-    static constexpr VarType kinds[] = {VarType::Empty,  VarType::Null,   VarType::Boolean, VarType::Integer,
-                                        VarType::Long,   VarType::Double, VarType::Date,    VarType::String,
-                                        VarType::Object, VarType::Array};
-    return kinds[v_.index()];
+    if (this != &o) {
+        Variant old(std::move(*this));  // released last, after the new value is in place
+        type_ = o.type_;
+        u_ = o.u_;
+        o.type_ = VarType::Empty;
+    }
+    return *this;
 }
 
 bool Variant::isNumeric() const
@@ -81,10 +105,6 @@ bool Variant::isNumeric() const
     default: return false;
     }
 }
-
-Object* Variant::object() const { return std::get<Ref<Object>>(v_).get(); }
-const VariantArray& Variant::array() const { return *std::get<ArrayBox>(v_).a; }
-VariantArray& Variant::array() { return *std::get<ArrayBox>(v_).a; }
 
 VariantArray::VariantArray(int32_t lo0, int32_t hi0, int32_t lo1, int32_t hi1) { allocate(lo0, hi0, lo1, hi1); }
 
@@ -115,7 +135,9 @@ size_t VariantArray::index(int32_t i, int32_t j) const
     const int64_t a = int64_t(i) - lo0_, b = int64_t(j) - lo1_;
     if (a < 0 || a >= n0_ || b < 0 || b >= n1_)
         throw Error::subscript("(" + std::to_string(i) + ", " + std::to_string(j) + ")");
-    return size_t(a) * size_t(n1_) + size_t(b);
+    // The first index runs fastest, as the automation layer lays arrays out: a job row's 65 fields
+    // and a point's series sit together.
+    return size_t(a) + size_t(b) * size_t(n0_);
 }
 
 Variant& VariantArray::at(int32_t i, int32_t j) { return cells_[index(i, j)]; }

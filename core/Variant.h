@@ -5,7 +5,6 @@
 #include <cstdint>
 #include <memory>
 #include <string>
-#include <variant>
 #include <vector>
 
 #include "core/Ref.h"
@@ -33,13 +32,13 @@ const char* typeName(VarType t);
 
 class Variant {
 public:
-    Variant() = default;                         // Empty
-    Variant(bool b) : v_(b) {}                   // NOLINT
-    Variant(int16_t i) : v_(i) {}                // NOLINT
-    Variant(int32_t l) : v_(l) {}                // NOLINT
-    Variant(double d) : v_(d) {}                 // NOLINT
-    Variant(std::string s) : v_(std::move(s)) {} // NOLINT
-    Variant(const char* s) : v_(std::string(s)) {} // NOLINT
+    Variant() noexcept { u_.d = 0; }             // Empty
+    Variant(bool b) noexcept : type_(VarType::Boolean) { u_.b = b; }      // NOLINT
+    Variant(int16_t i) noexcept : type_(VarType::Integer) { u_.i2 = i; }  // NOLINT
+    Variant(int32_t l) noexcept : type_(VarType::Long) { u_.i4 = l; }     // NOLINT
+    Variant(double d) noexcept : type_(VarType::Double) { u_.d = d; }     // NOLINT
+    Variant(std::string s);                      // NOLINT
+    Variant(const char* s);                      // NOLINT
     Variant(Ref<Object> o);                      // NOLINT
     Variant(Object* o);                          // NOLINT
     Variant(VariantArray a);                     // NOLINT
@@ -48,37 +47,46 @@ public:
     static Variant date(double serial);
 
     Variant(const Variant& o);
-    Variant(Variant&&) noexcept = default;
+    Variant(Variant&& o) noexcept : type_(o.type_), u_(o.u_) { o.type_ = VarType::Empty; }
     Variant& operator=(const Variant& o);
-    Variant& operator=(Variant&&) noexcept = default;
-    ~Variant();
+    Variant& operator=(Variant&& o) noexcept;
+    ~Variant() { if (ownsHeap()) release(); }
 
-    VarType type() const;
-    bool isEmpty() const { return v_.index() == 0; }
-    bool isNull() const { return v_.index() == 1; }
-    bool isString() const { return type() == VarType::String; }
-    bool isObject() const { return type() == VarType::Object; }
-    bool isArray() const { return type() == VarType::Array; }
+    VarType type() const { return type_; }
+    bool isEmpty() const { return type_ == VarType::Empty; }
+    bool isNull() const { return type_ == VarType::Null; }
+    bool isString() const { return type_ == VarType::String; }
+    bool isObject() const { return type_ == VarType::Object; }
+    bool isArray() const { return type_ == VarType::Array; }
     bool isNumeric() const;  // Boolean, Integer, Long, Double (not Date, not String)
 
     // Unchecked accessors: call only after checking type().
-    bool boolean() const { return std::get<bool>(v_); }
-    int16_t integer() const { return std::get<int16_t>(v_); }
-    int32_t longValue() const { return std::get<int32_t>(v_); }
-    double dbl() const { return std::get<double>(v_); }
-    double dateSerial() const { return std::get<DateBox>(v_).serial; }
-    const std::string& str() const { return std::get<std::string>(v_); }
-    Object* object() const;  // null for Nothing
-    const VariantArray& array() const;
-    VariantArray& array();
+    bool boolean() const { return u_.b; }
+    int16_t integer() const { return u_.i2; }
+    int32_t longValue() const { return u_.i4; }
+    double dbl() const { return u_.d; }
+    double dateSerial() const { return u_.d; }
+    const std::string& str() const { return *u_.s; }
+    Object* object() const { return u_.o; }  // null for Nothing
+    const VariantArray& array() const { return *u_.a; }
+    VariantArray& array() { return *u_.a; }
 
 private:
-    struct NullBox {};
-    struct DateBox { double serial; };
-    struct ArrayBox { std::unique_ptr<VariantArray> a; };
-    std::variant<std::monostate, NullBox, bool, int16_t, int32_t, double, DateBox, std::string,
-                 Ref<Object>, ArrayBox>
-        v_;
+    // Sixteen bytes a value: the value tables hold a great many of them.
+    bool ownsHeap() const { return type_ == VarType::String || type_ == VarType::Object || type_ == VarType::Array; }
+    void release() noexcept;
+    void copyFrom(const Variant& o);
+
+    VarType type_ = VarType::Empty;
+    union {
+        bool b;
+        int16_t i2;
+        int32_t i4;
+        double d;
+        std::string* s;
+        Object* o;
+        VariantArray* a;
+    } u_;
 };
 
 // A two-dimensional array of Variants, both dimensions from their lower bound (0 for the value table).

@@ -170,24 +170,32 @@ private:
         std::vector<int32_t> fieldOf(static_cast<size_t>(columns));
         for (int c = 0; c < columns; ++c) fieldOf[static_cast<size_t>(c)] = fieldOfColumn(sqlite3_column_name(stmt.get(), c));
 
-        std::vector<std::vector<Variant>> rows;
+        // Only the columns that fill a field are kept while stepping; the table is made once.
+        std::vector<std::pair<int32_t, int>> used;  // (field, column)
+        for (int c = 0; c < columns; ++c)
+            if (fieldOf[static_cast<size_t>(c)] >= 0) used.emplace_back(fieldOf[static_cast<size_t>(c)], c);
+        std::vector<Variant> cells;
         int rc;
-        while ((rc = sqlite3_step(stmt.get())) == SQLITE_ROW) {
-            std::vector<Variant> row(kFieldCount, Variant::null());
-            for (int c = 0; c < columns; ++c)
-                if (fieldOf[static_cast<size_t>(c)] >= 0)
-                    row[static_cast<size_t>(fieldOf[static_cast<size_t>(c)])] = cellValue(stmt.get(), c);
-            rows.push_back(std::move(row));
-        }
+        while ((rc = sqlite3_step(stmt.get())) == SQLITE_ROW)
+            for (const auto& [field, column] : used) cells.push_back(cellValue(stmt.get(), column));
         if (rc != SQLITE_DONE) fail(std::string("cannot be read: ") + sqlite3_errmsg(db));
 
-        count = static_cast<int32_t>(rows.size());
-        if (rows.empty()) return {};
+        const size_t perRow = used.size();
+        count = perRow ? static_cast<int32_t>(cells.size() / perRow) : 0;
+        if (!perRow) {
+            // No column fills a field: count the rows alone.
+            sqlite3_reset(stmt.get());
+            while (sqlite3_step(stmt.get()) == SQLITE_ROW) ++count;
+        }
+        if (count == 0) return {};
         VariantArray table(0, kFieldCount - 1, 0, count - 1);
-        for (int32_t r = 0; r < count; ++r)
-            for (int32_t f = 0; f < kFieldCount; ++f)
-                table.at(f, r) = std::move(rows[static_cast<size_t>(r)][static_cast<size_t>(f)]);
-        return table;
+        const Variant null = Variant::null();
+        for (int32_t r = 0; r < count; ++r) {
+            for (int32_t f = 0; f < kFieldCount; ++f) table.at(f, r) = null;
+            for (size_t u = 0; u < perRow; ++u)
+                table.at(used[u].first, r) = std::move(cells[size_t(r) * perRow + u]);
+        }
+        return Variant(std::move(table));
     }
 
     std::string path_;
