@@ -4,6 +4,7 @@
 #include <QDir>
 #include <QFile>
 #include <QImage>
+#include <sys/stat.h>
 
 #include "chart/control/render/ChartExport.h"
 #include "core/Error.h"
@@ -43,7 +44,7 @@ TEST_P(ExportFormatTest, WritesTheFormatTheExtensionNames)
     exportChart(chart, path.toStdString(), QSize(640, 480));
     const QByteArray bytes = readAll(path);
     EXPECT_TRUE(bytes.contains(GetParam().magic)) << bytes.left(64).toStdString();
-    EXPECT_EQ(QDir(dir.path()).entryList(QDir::Files).size(), 1);  // no temporary file left over
+    EXPECT_EQ(QDir(dir.path()).entryList(QDir::Files | QDir::Hidden).size(), 1);  // no temporary file left over
 }
 
 INSTANTIATE_TEST_SUITE_P(Formats, ExportFormatTest,
@@ -101,7 +102,7 @@ TEST_P(ExportFailureTest, FailsWithoutLeavingAFile)
     ASSERT_TRUE(keep.open(QIODevice::WriteOnly));
     keep.write("old");
     keep.close();
-    const QStringList before = QDir(dir.path()).entryList(QDir::AllEntries | QDir::NoDotAndDotDot);
+    const QStringList before = QDir(dir.path()).entryList(QDir::AllEntries | QDir::Hidden | QDir::NoDotAndDotDot);
 
     const std::string path = dir.filePath(QString::fromUtf8(GetParam().file)).toStdString();
     try {
@@ -111,7 +112,7 @@ TEST_P(ExportFailureTest, FailsWithoutLeavingAFile)
         EXPECT_EQ(e.number(), GetParam().number);
         EXPECT_NE(e.description().find(GetParam().named), std::string::npos) << e.description();
     }
-    EXPECT_EQ(QDir(dir.path()).entryList(QDir::AllEntries | QDir::NoDotAndDotDot), before);
+    EXPECT_EQ(QDir(dir.path()).entryList(QDir::AllEntries | QDir::Hidden | QDir::NoDotAndDotDot), before);
     EXPECT_EQ(readAll(dir.filePath(QStringLiteral("keep.png"))), QByteArray("old"));
 }
 
@@ -125,6 +126,41 @@ INSTANTIATE_TEST_SUITE_P(
         FailureCase{"folderInTheWay", "taken.png", {800, 600}, errc::PathFileAccess, "taken.png"},
         FailureCase{"badSizeKeepsTheOldFile", "keep.png", {0, 600}, errc::InvalidProcedureCall, "size"}),
     [](const auto& info) { return std::string(info.param.name); });
+
+struct ModeCase {
+    const char* name;
+    mode_t existing;  // 0: no file before the export
+};
+
+class ExportModeTest : public ::testing::TestWithParam<ModeCase> {};
+
+// A new file is readable as the user's file mask allows (not owner-only like a temporary file);
+// a replaced file keeps the mode it had.
+TEST_P(ExportModeTest, FileModeIsThatOfAnOrdinaryFile)
+{
+    ChartControl chart;
+    sampleChart(chart);
+    QTemporaryDir dir = samples::scratchDir();
+    const QByteArray path = QFile::encodeName(dir.filePath(QStringLiteral("chart.svg")));
+    if (GetParam().existing) {
+        QFile old(QString::fromLocal8Bit(path));
+        ASSERT_TRUE(old.open(QIODevice::WriteOnly));
+        old.close();
+        ASSERT_EQ(::chmod(path.constData(), GetParam().existing), 0);
+    }
+    const mode_t mask = ::umask(0);
+    ::umask(mask);
+    exportChart(chart, path.toStdString(), QSize(200, 100));
+    struct stat st {};
+    ASSERT_EQ(::stat(path.constData(), &st), 0);
+    const mode_t expected = GetParam().existing ? GetParam().existing : (0666 & ~mask);
+    EXPECT_EQ(st.st_mode & 0777, expected);
+}
+
+INSTANTIATE_TEST_SUITE_P(Modes, ExportModeTest,
+                         ::testing::Values(ModeCase{"newFile", 0}, ModeCase{"replacedPrivateFile", 0600},
+                                           ModeCase{"replacedSharedFile", 0664}),
+                         [](const auto& info) { return std::string(info.param.name); });
 
 }  // namespace
 }  // namespace kg::control

@@ -5,12 +5,12 @@
 #include <QPageSize>
 #include <QPainter>
 #include <QPdfWriter>
-#include <QSaveFile>
 #include <QSvgGenerator>
 
 #include "chart/control/render/ChartPainter.h"
 #include "chart/control/render/Colors.h"
 #include "chart/control/render/PngWriter.h"
+#include "chart/control/render/WholeFile.h"
 #include "core/Error.h"
 
 namespace kg::control {
@@ -66,10 +66,6 @@ QByteArray pdfBytes(const ChartControl& chart, QSize size)
     return buffer.data();
 }
 
-Error cannotWrite(const std::string& path, const QString& why)
-{
-    return Error(errc::PathFileAccess, "Path/File access error: cannot write " + path + ": " + why.toStdString());
-}
 }  // namespace
 
 QImage renderImage(const ChartControl& chart, QSize size)
@@ -96,17 +92,13 @@ void exportChart(const ChartControl& chart, const std::string& path, QSize size)
                                  " (use .png, .svg or .pdf)");
     }
     checkSize(size);
-    QSaveFile out(file);
-    if (!out.open(QIODevice::WriteOnly)) throw cannotWrite(path, out.errorString());
+    // The folder is tried before the painting, so that a wrong path fails at once.
+    if (!QFileInfo(QFileInfo(file).absolutePath()).isDir())
+        throw Error(errc::PathFileAccess, "Path/File access error: cannot write " + path + ": no such folder");
     const QByteArray bytes = suffix == QLatin1String("png")   ? encodePng(renderImage(chart, size))
                              : suffix == QLatin1String("svg") ? svgBytes(chart, size)
                                                               : pdfBytes(chart, size);
-    if (out.write(bytes) != bytes.size()) {
-        const QString why = out.errorString();
-        out.cancelWriting();
-        throw cannotWrite(path, why);
-    }
-    if (!out.commit()) throw cannotWrite(path, out.errorString());
+    writeWholeFile(path, bytes);
 }
 
 }  // namespace kg::control
