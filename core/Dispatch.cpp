@@ -10,8 +10,8 @@ bool equalsNoCase(std::string_view a, std::string_view b)
     if (a.size() != b.size()) return false;
     for (size_t i = 0; i < a.size(); ++i) {
         unsigned char x = static_cast<unsigned char>(a[i]), y = static_cast<unsigned char>(b[i]);
-        if (x - 'A' < 26u) x |= 0x20;
-        if (y - 'A' < 26u) y |= 0x20;
+        if (unsigned(x - 'A') < 26u) x |= 0x20;
+        if (unsigned(y - 'A') < 26u) y |= 0x20;
         if (x != y) return false;
     }
     return true;

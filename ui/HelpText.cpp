@@ -120,11 +120,13 @@ void buildChartHelp(QTextDocument& document)
         format.setIndent(1);
         bool first = true;
         for (const char* item : items) {
-            if (first)
-                cursor.insertList(format);
-            else
+            // Items are close together; later items inherit the first one's list and spacing.
+            if (first) {
+                cursor.insertBlock(paragraphFormat(0), plain);
+                cursor.createList(format);
+            } else {
                 cursor.insertBlock();
-            cursor.setBlockCharFormat(plain);
+            }
             cursor.insertText(QString::fromUtf8(item), plain);
             first = false;
         }

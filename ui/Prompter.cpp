@@ -1,6 +1,7 @@
 #include "ui/Prompter.h"
 
 #include <QDialog>
+#include <QFileDialog>
 #include <QMessageBox>
 
 namespace kg::ui {
@@ -12,6 +13,21 @@ void QtPrompter::showMessage(const std::string& text)
 }
 
 void QtPrompter::execModal(QDialog& dialog) { dialog.exec(); }
+
+std::string QtPrompter::askSaveFile(const std::string& caption, const std::string& filter)
+{
+    return QFileDialog::getSaveFileName(nullptr, QString::fromStdString(caption), QString(),
+                                        QString::fromStdString(filter))
+        .toStdString();
+}
+
+std::string ScriptedPrompter::askSaveFile(const std::string&, const std::string&)
+{
+    if (saveFiles.empty()) return {};
+    std::string answer = std::move(saveFiles.front());
+    saveFiles.pop_front();
+    return answer;
+}
 
 void ScriptedPrompter::execModal(QDialog& dialog)
 {

@@ -23,12 +23,15 @@ public:
     virtual void showMessage(const std::string& text) = 0;
     // Runs the dialog modally; returns when it has closed.
     virtual void execModal(QDialog& dialog) = 0;
+    // Asks for a file to write; empty when the user cancelled. `filter` as QFileDialog takes it.
+    virtual std::string askSaveFile(const std::string& caption, const std::string& filter) = 0;
 };
 
 class QtPrompter : public Prompter {
 public:
     void showMessage(const std::string& text) override;
     void execModal(QDialog& dialog) override;
+    std::string askSaveFile(const std::string& caption, const std::string& filter) override;
 };
 
 // Answers from a queue: each modal dialog is handed to the next answer, which works its controls
@@ -38,8 +41,10 @@ public:
     using Answer = std::function<void(QDialog&)>;
     void showMessage(const std::string& text) override { messages.push_back(text); }
     void execModal(QDialog& dialog) override;
+    std::string askSaveFile(const std::string& caption, const std::string& filter) override;
 
     std::vector<std::string> messages;
+    std::deque<std::string> saveFiles;  // answers of the save questions; none left: cancelled
     std::deque<Answer> answers;
     std::vector<std::string> dialogsShown;  // object names of the dialogs, in order
 };

@@ -67,4 +67,12 @@ void QtUi::setMousePointer(int pointer)
 
 void installQtUi() { setUiServices(std::make_unique<QtUi>()); }
 
+void installQtUiForApplication()
+{
+    static bool installed = false;
+    if (installed || !qobject_cast<QApplication*>(QCoreApplication::instance())) return;
+    installed = true;
+    installQtUi();
+}
+
 }  // namespace kg::ui

@@ -27,5 +27,7 @@ private:
 
 // Installs the Qt windows as the component's UI (needs a QApplication).
 void installQtUi();
+// Installs them once when the process has a QApplication (a widget host); otherwise does nothing.
+void installQtUiForApplication();
 
 }  // namespace kg::ui

@@ -1,16 +1,22 @@
 #include "ui/frmChart.h"
 
 #include <QAction>
+#include <QClipboard>
 #include <QCloseEvent>
+#include <QGuiApplication>
 #include <QMenuBar>
 
+#include "chart/control/render/ChartExport.h"
 #include "chart/control/render/ChartPrinting.h"
 #include "chart/control/view/ChartView.h"
 #include "component/Requests.h"
 #include "component/modMain.h"
 #include "core/Error.h"
+#include "ui/AdvancedHelp.h"
 #include "ui/Prompter.h"
 #include "ui/WindowObject.h"
+#include "ui/frmChartHelp.h"
+#include "ui/frmChartSetup.h"
 
 namespace kg::ui {
 
@@ -44,10 +50,7 @@ void frmChart::buildMenu()
     mnuTop[2] = menuBar()->addMenu("Help");
     for (int i = 0; i < 3; ++i) mnuTop[i]->setObjectName(QString("mnuTop_%1").arg(i));
 
-    mnuSetup = mnuTop[0]->addAction("Chart Settings");
-    mnuSetup->setObjectName("mnuSetup");
-    mnuSetup->setShortcut(Qt::Key_F2);
-    mnuSetup->setEnabled(false);
+    mnuSetup = item(mnuTop[0], "mnuSetup", "Chart Settings", Qt::Key_F2, &frmChart::mnuSetup_Click);
     mnuPrint = item(mnuTop[0], "mnuPrint", "Print Chart", Qt::Key_F8, &frmChart::mnuPrint_Click);
     mnuClose = mnuTop[0]->addAction("Close");
     mnuClose->setObjectName("mnuClose");
@@ -58,14 +61,14 @@ void frmChart::buildMenu()
     mnuLabels2 = item(mnuTop[1], "mnuLabels2", "Labels Off", Qt::Key_F4, &frmChart::mnuLabels2_Click);
     mnuRedraw = item(mnuTop[1], "mnuRedraw", "Redraw", Qt::Key_F5, &frmChart::mnuRedraw_Click);
 
-    mnuHelp = mnuTop[2]->addAction("Mouse and Keys Help");
-    mnuHelp->setObjectName("mnuHelp");
-    mnuHelp->setShortcut(QKeySequence(Qt::CTRL | Qt::Key_F1));
-    mnuHelp->setEnabled(false);
-    mnuAdvHelp = mnuTop[2]->addAction("Advanced Chart Help");
-    mnuAdvHelp->setObjectName("mnuAdvHelp");
-    mnuAdvHelp->setShortcut(Qt::Key_F1);
-    mnuAdvHelp->setEnabled(false);
+    mnuHelp = item(mnuTop[2], "mnuHelp", "Mouse and Keys Help", QKeySequence(Qt::CTRL | Qt::Key_F1),
+                   &frmChart::mnuHelp_Click);
+    mnuAdvHelp = item(mnuTop[2], "mnuAdvHelp", "Advanced Chart Help", Qt::Key_F1, &frmChart::mnuAdvHelp_Click);
+
+    // After the host's items, so their captions, order and keys stay as the host knows them.
+    mnuTop[0]->addSeparator();
+    mnuSaveAs = item(mnuTop[0], "mnuSaveAs", "Save As...", QKeySequence::SaveAs, &frmChart::mnuSaveAs_Click);
+    mnuCopy = item(mnuTop[0], "mnuCopy", "Copy", QKeySequence::Copy, &frmChart::mnuCopy_Click);
 }
 
 void frmChart::Form_Load()
@@ -120,6 +123,36 @@ void frmChart::mnuLabels2_Click() { setLabels(false); }
 void frmChart::mnuRedraw_Click()
 {
     if (giChartKind == kBookings || giChartKind == kCategories) requests::chooseAndDrawMeasure(giChartKind);
+}
+
+void frmChart::mnuSetup_Click()
+{
+    showChartSetup();
+    // Redrawn after OK and after Cancel alike.
+    chart().DrawChart(gvArray);
+}
+
+void frmChart::mnuHelp_Click() { showChartHelp(); }
+void frmChart::mnuAdvHelp_Click() { openAdvancedHelp(); }
+
+namespace {
+// The size the chart is shown at: exports look like the window.
+QSize shownSize(const control::ChartView* view) { return view->size().expandedTo(QSize(16, 16)); }
+}  // namespace
+
+void frmChart::mnuSaveAs_Click()
+{
+    const std::string path =
+        prompter().askSaveFile("Save Chart As", "PNG image (*.png);;SVG drawing (*.svg);;PDF document (*.pdf)");
+    if (path.empty()) return;
+    const QString file = QString::fromStdString(path);
+    const bool known = file.endsWith(".png") || file.endsWith(".svg") || file.endsWith(".pdf");
+    control::exportChart(*chart_, known ? path : path + ".png", shownSize(view_));
+}
+
+void frmChart::mnuCopy_Click()
+{
+    QGuiApplication::clipboard()->setImage(control::renderImage(*chart_, shownSize(view_)));
 }
 
 }  // namespace kg::ui

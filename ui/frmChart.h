@@ -32,6 +32,9 @@ public:
     QAction* mnuRedraw = nullptr;
     QAction* mnuHelp = nullptr;
     QAction* mnuAdvHelp = nullptr;
+    // Beyond the host's menu: put the chart into a report.
+    QAction* mnuSaveAs = nullptr;
+    QAction* mnuCopy = nullptr;
 
     void Form_Load();
     // The window's commands, callable as the menu calls them.
@@ -39,6 +42,11 @@ public:
     void mnuLabels1_Click();
     void mnuLabels2_Click();
     void mnuRedraw_Click();
+    void mnuSetup_Click();
+    void mnuHelp_Click();
+    void mnuAdvHelp_Click();
+    void mnuSaveAs_Click();
+    void mnuCopy_Click();
 
     // Called once the window has unloaded (after its shared objects were released).
     std::function<void()> onUnloaded;

@@ -37,6 +37,7 @@ frmChartHelp::frmChartHelp()
     Text1->setReadOnly(true);
     Text1->setOpenLinks(false);
     buildChartHelp(*Text1->document());
+    Text1->moveCursor(QTextCursor::Start);  // open at the title, not where the building ended
     Text1->move(0, 0);
     resize(9852 / kTwipsPerPixel, 5304 / kTwipsPerPixel);
     Form_Resize();

@@ -8,3 +8,5 @@ int runRegister(int argc, char** argv);
 int runUnregister(int argc, char** argv);
 // Runs one chart request and writes the chart to an image file.
 int runRender(int argc, char** argv);
+// Draws every chart of the sample data into a folder, with an index page.
+int runGallery(int argc, char** argv);

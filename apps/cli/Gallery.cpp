@@ -161,7 +161,7 @@ int runGallery(int argc, char** argv)
         const Chart& c = charts[i];
         std::printf("chart %zu of %zu: %s\n", i + 1, charts.size(), c.title.c_str());
         std::fflush(stdout);
-        char file[16];
+        char file[32];
         std::snprintf(file, sizeof file, "chart-%02zu", i + 1);
         Entry entry{c.title, c.style.text(), file, {}};
         try {

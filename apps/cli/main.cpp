@@ -1,5 +1,5 @@
 // The karstgraph tool: a table of commands. describe, register and unregister need no application
-// object and start at once; render makes its own.
+// object and start at once; render and gallery make their own.
 #include <cstdio>
 #include <cstring>
 #include <filesystem>
@@ -27,6 +27,7 @@ const Command kCommands[] = {
     {"unregister", "", "remove the component's entries from this user's registration file", runUnregister},
     {"render", "FORM.json REQUEST ... -o OUT", "run one chart request and write the chart to an image",
      runRender},
+    {"gallery", "OUTDIR", "draw every chart of the sample data, with an index page", runGallery},
 };
 
 void printUsage(std::FILE* to)

@@ -3,6 +3,7 @@
 #include <atomic>
 
 #include "component/cTavixGraph.h"
+#include "ui/QtUi.h"
 #include "component/export/Boundary.h"
 #include "component/export/Guids.h"
 #include "component/export/Objects.h"
@@ -36,6 +37,8 @@ int32_t factoryCreateInstance(KGClassFactory*, KGObject** out)
     if (!out) return KG_E_POINTER;
     *out = nullptr;
     return guardedKeepingError([&] {
+        // A host with a Qt application gets the chart windows; one without keeps the headless UI.
+        ui::installQtUiForApplication();
         *out = exportObject(makeRef<cTavixGraph>());
         return KG_S_OK;
     });

@@ -2,6 +2,7 @@
 // under "ChartHelp".
 #include <QCoreApplication>
 #include <QFile>
+#include <QScrollBar>
 #include <QTextBlock>
 #include <QTextBrowser>
 #include <QTextDocument>
@@ -191,6 +192,7 @@ TEST_F(HelpFixture, OpensAsDesignedAndReportsItsLoad)
     EXPECT_TRUE(w->Text1->isReadOnly());
     EXPECT_EQ(w->Text1->geometry(), QRect(0, 0, 656, 353));
     EXPECT_TRUE(w->Text1->toPlainText().startsWith("Interacting with the Chart"));
+    EXPECT_EQ(w->Text1->verticalScrollBar()->value(), 0);  // opens at the title
     EXPECT_EQ(events(), std::vector<std::string>{"FormLoad frmChartHelp"});
 }
 
