@@ -59,7 +59,6 @@ std::vector<Chart> galleryCharts(const kg::host::teststand::SampleTotals& totals
             const char* request = pie ? "GenerateChart_BookingsReport" : "GenerateChart_PropGraph1";
             kg::cli::RequestCall call{request, std::nullopt, kg::Variant(totals.quantity),
                                       pie ? std::optional<int16_t>(1) : std::nullopt};
-            if (!pie) call.series = 3;
             charts.push_back({std::string(type) + (view3D ? " 3-D" : " flat") + ": " + request, call, style});
         }
     return charts;
