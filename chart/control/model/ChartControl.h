@@ -152,8 +152,9 @@ struct Legend {
     int layout2 = 10;
 };
 
-// Interactive view state: scale, move and graphics zoom of the chart inside the chart area.
-// Identity when scale is 1, offsets 0 and no zoom window.
+// Interactive view state: scale, move and graphics zoom of the chart inside the chart area. A
+// graphics zoom is one more scale and move, so these three numbers hold all of it. Identity when
+// scale is 1 and offsets 0.
 struct ViewState {
     double scale = 1.0;                 // about the chart area's centre
     double offsetX = 0, offsetY = 0;    // in chart area fractions

@@ -105,6 +105,12 @@ void paintValueLabels(const PaintContext& ctx)
     // Points hidden by an axis zoom have no label.
     const QRectF shown = L.kind == ChartKind::Pie ? L.chartContent : L.plotArea.united(L.plotArea.translated(L.depth));
     Occupancy drawn(L.chartContent);
+    // What the view shows of the chart (all of it unless scaled, moved or zoomed), in the chart's
+    // own coordinates. Labels outside it still take their room, so that moving the chart never
+    // changes which labels are shown; they are only not drawn.
+    bool invertible = false;
+    const QTransform back = L.view.inverted(&invertible);
+    const QRectF inView = invertible ? back.mapRect(L.chartContent) : L.chartContent;
     for (const ChartLabel& label : ctx.chart.chartLabels) {
         if (label.attachMethod != 2) continue;
         const std::optional<LabelAnchor> anchor = anchorOf(ctx, label);
@@ -123,6 +129,7 @@ void paintValueLabels(const PaintContext& ctx)
         const QRectF taken = label.border == kBorderShadow ? box.adjusted(0, 0, kShadow, kShadow) : box;
         if (drawn.overlaps(taken)) continue;
         drawn.add(taken);
+        if (!taken.united(QRectF(anchor->point, QSizeF(0, 0))).adjusted(-2, -2, 2, 2).intersects(inView)) continue;
         if (label.isConnected) {
             p.setPen(ctx.thinPen(QColor(0x30, 0x30, 0x30)));
             p.drawLine(anchor->point, nearestOn(box, anchor->point));
