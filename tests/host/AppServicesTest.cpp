@@ -15,30 +15,12 @@
 #include "core/Date.h"
 #include "core/Error.h"
 #include "host/TestStand.h"
+#include "HostTestSupport.h"
 
 using namespace kg;
 using namespace kg::host::teststand;
 
 namespace {
-
-QString tempTemplate()
-{
-    const QByteArray base = qgetenv("KG_TEST_TMP");
-    const QString folder = base.isEmpty() ? QDir::tempPath() : QString::fromLocal8Bit(base);
-    QDir().mkpath(folder);
-    return folder + "/app-XXXXXX";
-}
-
-Error errorOf(const std::function<void()>& f)
-{
-    try {
-        f();
-    } catch (const Error& e) {
-        return e;
-    }
-    ADD_FAILURE() << "no error was raised";
-    return Error(0, "");
-}
 
 QByteArray fileBytes(const QString& path)
 {
@@ -105,7 +87,7 @@ protected:
         return v.isString() ? v.str() : std::string();
     }
 
-    QTemporaryDir dir_{tempTemplate()};
+    QTemporaryDir dir_{test::tempTemplate("app")};
     Variant app_;
 };
 
@@ -177,10 +159,10 @@ INSTANTIATE_TEST_SUITE_P(Cells, CellText,
 
 TEST_F(AppServices, CellThatIsNoValueIsATypeMismatch)
 {
-    EXPECT_EQ(errorOf([&] { out("CellToText", {int32_t{0}, int32_t{0}, Variant(VariantArray(0, 0, 0, 0)), ""}); })
+    EXPECT_EQ(test::errorOf([&] { out("CellToText", {int32_t{0}, int32_t{0}, Variant(VariantArray(0, 0, 0, 0)), ""}); })
                   .number(),
               errc::TypeMismatch);
-    EXPECT_EQ(errorOf([&] { out("CellToNumberText", {int32_t{1}, Variant(makeRef<FakeWindow>()), ""}); }).number(),
+    EXPECT_EQ(test::errorOf([&] { out("CellToNumberText", {int32_t{1}, Variant(makeRef<FakeWindow>()), ""}); }).number(),
               errc::TypeMismatch);
 }
 
@@ -270,8 +252,8 @@ INSTANTIATE_TEST_SUITE_P(
 
 TEST_F(AppServices, PlacementOfSomethingThatIsNoWindowFails)
 {
-    EXPECT_EQ(errorOf([&] { call(app_, "SaveFormState", {Variant(), "Chart"}); }).number(), errc::ObjectNotSet);
-    EXPECT_EQ(errorOf([&] { call(app_, "SaveFormState", {Variant(makeRef<FakeWindow>()), ""}); }).number(),
+    EXPECT_EQ(test::errorOf([&] { call(app_, "SaveFormState", {Variant(), "Chart"}); }).number(), errc::ObjectNotSet);
+    EXPECT_EQ(test::errorOf([&] { call(app_, "SaveFormState", {Variant(makeRef<FakeWindow>()), ""}); }).number(),
               errc::InvalidProcedureCall);
 }
 
@@ -355,17 +337,17 @@ TEST_F(AppServices, DefaultShellErrorReportGoesToStderr)
 
 TEST_F(AppServices, WrongArgumentCountsAreRefused)
 {
-    EXPECT_EQ(errorOf([&] { call(app_, "GetAppFolder"); }).number(), errc::WrongArgumentCount);
-    EXPECT_EQ(errorOf([&] { call(app_, "CellToText", {int32_t{0}, Variant(), ""}); }).number(),
+    EXPECT_EQ(test::errorOf([&] { call(app_, "GetAppFolder"); }).number(), errc::WrongArgumentCount);
+    EXPECT_EQ(test::errorOf([&] { call(app_, "CellToText", {int32_t{0}, Variant(), ""}); }).number(),
               errc::WrongArgumentCount);
-    EXPECT_EQ(errorOf([&] { call(app_, "LogFormEvent", {"FormLoad"}); }).number(), errc::WrongArgumentCount);
+    EXPECT_EQ(test::errorOf([&] { call(app_, "LogFormEvent", {"FormLoad"}); }).number(), errc::WrongArgumentCount);
 }
 
 TEST(HostAux, IsCreatedAndHasNoMembers)
 {
     const Variant aux(makeFactory()->create(host::HostClass::HostAux));
     ASSERT_TRUE(aux.isObject());
-    EXPECT_EQ(errorOf([&] { call(aux, "Anything"); }).number(), errc::MemberNotFound);
+    EXPECT_EQ(test::errorOf([&] { call(aux, "Anything"); }).number(), errc::MemberNotFound);
 }
 
 TEST(HostObjects, FactoryIsTheTestStandsByDefault)

@@ -10,6 +10,7 @@
 #include "core/Date.h"
 #include "core/Error.h"
 #include "host/TestStand.h"
+#include "HostTestSupport.h"
 
 using namespace kg;
 using namespace kg::host::teststand;
@@ -17,14 +18,6 @@ using namespace kg::host::teststand;
 namespace {
 
 const std::string kSample = std::string(KG_TEST_DATA) + "/host/form_sample.json";
-
-QString tempTemplate()
-{
-    const QByteArray base = qgetenv("KG_TEST_TMP");
-    const QString folder = base.isEmpty() ? QDir::tempPath() : QString::fromLocal8Bit(base);
-    QDir().mkpath(folder);
-    return folder + "/fault-XXXXXX";
-}
 
 struct FaultCase {
     const char* name;
@@ -45,7 +38,7 @@ protected:
 
 TEST_P(FaultPlanCase, FailsExactlyTheNthCall)
 {
-    QTemporaryDir dir(tempTemplate());
+    QTemporaryDir dir(test::tempTemplate("fault"));
     ASSERT_TRUE(dir.isValid());
     config().settingsFile = dir.filePath("settings.ini").toStdString();
     const std::function<void()> once = GetParam().prepare(dir);

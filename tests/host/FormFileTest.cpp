@@ -10,6 +10,7 @@
 #include "core/Date.h"
 #include "core/Error.h"
 #include "host/TestStand.h"
+#include "HostTestSupport.h"
 
 using namespace kg;
 using namespace kg::host::teststand;
@@ -18,14 +19,6 @@ namespace {
 
 const std::string kSample = std::string(KG_TEST_DATA) + "/host/form_sample.json";
 
-QString tempTemplate()
-{
-    const QByteArray base = qgetenv("KG_TEST_TMP");
-    const QString folder = base.isEmpty() ? QDir::tempPath() : QString::fromLocal8Bit(base);
-    QDir().mkpath(folder);
-    return folder + "/form-XXXXXX";
-}
-
 std::string writeFile(const QTemporaryDir& dir, const char* name, const std::string& text)
 {
     const QString path = dir.filePath(QString::fromLatin1(name));
@@ -33,17 +26,6 @@ std::string writeFile(const QTemporaryDir& dir, const char* name, const std::str
     EXPECT_TRUE(f.open(QIODevice::WriteOnly));
     f.write(text.data(), static_cast<qint64>(text.size()));
     return path.toStdString();
-}
-
-Error errorOf(const std::function<void()>& f)
-{
-    try {
-        f();
-    } catch (const Error& e) {
-        return e;
-    }
-    ADD_FAILURE() << "no error was raised";
-    return Error(0, "");
 }
 
 Variant grid1() { return call(Variant(loadFormFile(kSample)), "grid1"); }
@@ -77,15 +59,15 @@ TEST(FormFile, FieldListOneHoldsTheCaptions)
     EXPECT_EQ(toLong(call(list, "ListCount")), 13);
     EXPECT_EQ(call(list, "List", {0}).str(), "Unconfirmed");
     EXPECT_EQ(call(list, "List", {12}).str(), "Imported");
-    EXPECT_EQ(errorOf([&] { call(list, "List", {13}); }).number(), errc::SubscriptOutOfRange);
+    EXPECT_EQ(test::errorOf([&] { call(list, "List", {13}); }).number(), errc::SubscriptOutOfRange);
 }
 
 TEST(FormFile, OtherFieldListIndexIsASubscriptError)
 {
     const Variant form(loadFormFile(kSample));
-    EXPECT_EQ(errorOf([&] { call(form, "cboFields", {2}); }).number(), errc::SubscriptOutOfRange);
-    EXPECT_EQ(errorOf([&] { call(form, "cboFields", {0}); }).number(), errc::SubscriptOutOfRange);
-    EXPECT_EQ(errorOf([&] { call(form, "cboFields"); }).number(), errc::WrongArgumentCount);
+    EXPECT_EQ(test::errorOf([&] { call(form, "cboFields", {2}); }).number(), errc::SubscriptOutOfRange);
+    EXPECT_EQ(test::errorOf([&] { call(form, "cboFields", {0}); }).number(), errc::SubscriptOutOfRange);
+    EXPECT_EQ(test::errorOf([&] { call(form, "cboFields"); }).number(), errc::WrongArgumentCount);
 }
 
 TEST(FormFile, JobsDatabaseResolvesAgainstTheFormFolder)
@@ -99,14 +81,14 @@ TEST(FormFile, MembersTheFileLacksAreMissingMembers)
 {
     const Variant form(loadFormFile(kSample));
     for (const char* member : {"grid2", "grid3", "Caption", "jobsDatabase"}) {
-        const Error e = errorOf([&] { call(form, member); });
+        const Error e = test::errorOf([&] { call(form, member); });
         EXPECT_EQ(e.number(), errc::MemberNotFound) << member;
         EXPECT_NE(e.description().find(member), std::string::npos) << e.description();
     }
     const Variant empty(loadFormJson("{}", "inline"));
     for (const char* member : {"grid1", "gridsettings1", "dtpFromDate", "cboFields"})
-        EXPECT_EQ(errorOf([&] { call(empty, member); }).number(), errc::MemberNotFound) << member;
-    EXPECT_EQ(errorOf([&] { call(grid1(), "TextArray", {0, 0}); }).number(), errc::MemberNotFound);
+        EXPECT_EQ(test::errorOf([&] { call(empty, member); }).number(), errc::MemberNotFound) << member;
+    EXPECT_EQ(test::errorOf([&] { call(grid1(), "TextArray", {0, 0}); }).number(), errc::MemberNotFound);
 }
 
 TEST(FormFile, NamesAreMatchedWithoutRegardToCase)
@@ -134,7 +116,7 @@ TEST_P(CellOutsideTheGrid, IsASubscriptError)
 {
     const Variant grid = grid1();
     for (const char* member : {"textmatrix", "GetValueFromCell"}) {
-        const Error e = errorOf([&] { call(grid, member, {GetParam().row, GetParam().col}); });
+        const Error e = test::errorOf([&] { call(grid, member, {GetParam().row, GetParam().col}); });
         EXPECT_EQ(e.number(), errc::SubscriptOutOfRange) << member;
         EXPECT_NE(e.description().find("grid1"), std::string::npos) << e.description();
     }
@@ -194,7 +176,7 @@ TEST(FormFile, GridWithoutFixedRowsDefaultsToOneCaptionRow)
 
 TEST(FormFile, MembersCannotBeAssigned)
 {
-    EXPECT_EQ(errorOf([] { put(grid1(), "Rows", 5); }).number(), errc::InvalidProcedureCall);
+    EXPECT_EQ(test::errorOf([] { put(grid1(), "Rows", 5); }).number(), errc::InvalidProcedureCall);
 }
 
 struct MalformedCase {
@@ -207,10 +189,10 @@ class MalformedFormFile : public testing::TestWithParam<MalformedCase> {};
 
 TEST_P(MalformedFormFile, IsRefusedNamingFileMemberAndRow)
 {
-    QTemporaryDir dir(tempTemplate());
+    QTemporaryDir dir(test::tempTemplate("form"));
     ASSERT_TRUE(dir.isValid());
     const std::string path = writeFile(dir, "form.json", GetParam().json);
-    const Error e = errorOf([&] { loadFormFile(path); });
+    const Error e = test::errorOf([&] { loadFormFile(path); });
     EXPECT_EQ(e.number(), errc::HostBase + hosterr::FormFile);
     EXPECT_NE(e.description().find(path), std::string::npos) << e.description();
     for (const char* part : GetParam().named) EXPECT_NE(e.description().find(part), std::string::npos) << e.description();
@@ -246,24 +228,24 @@ INSTANTIATE_TEST_SUITE_P(
 
 TEST(FormFile, MissingFileIsFileNotFound)
 {
-    QTemporaryDir dir(tempTemplate());
+    QTemporaryDir dir(test::tempTemplate("form"));
     const std::string path = dir.filePath("nothing.json").toStdString();
-    const Error e = errorOf([&] { loadFormFile(path); });
+    const Error e = test::errorOf([&] { loadFormFile(path); });
     EXPECT_EQ(e.number(), errc::FileNotFound);
     EXPECT_NE(e.description().find(path), std::string::npos);
 }
 
 TEST(FormFile, FolderIsNotAFormFile)
 {
-    QTemporaryDir dir(tempTemplate());
-    const Error e = errorOf([&] { loadFormFile(dir.path().toStdString()); });
+    QTemporaryDir dir(test::tempTemplate("form"));
+    const Error e = test::errorOf([&] { loadFormFile(dir.path().toStdString()); });
     EXPECT_EQ(e.number(), errc::PathFileAccess);
     EXPECT_NE(e.description().find(dir.path().toStdString()), std::string::npos);
 }
 
 TEST(FormFile, InlineJsonIsNamedAsGiven)
 {
-    const Error e = errorOf([] { loadFormJson(R"({"grid1": {"cells": [[1], [1, 2]]}})", "inline form"); });
+    const Error e = test::errorOf([] { loadFormJson(R"({"grid1": {"cells": [[1], [1, 2]]}})", "inline form"); });
     EXPECT_NE(e.description().find("inline form"), std::string::npos);
     EXPECT_NE(e.description().find("grid1, row 1"), std::string::npos);
 }

@@ -13,30 +13,12 @@
 #include "core/Date.h"
 #include "core/Error.h"
 #include "host/TestStand.h"
+#include "HostTestSupport.h"
 
 using namespace kg;
 using namespace kg::host::teststand;
 
 namespace {
-
-QString tempTemplate()
-{
-    const QByteArray base = qgetenv("KG_TEST_TMP");
-    const QString folder = base.isEmpty() ? QDir::tempPath() : QString::fromLocal8Bit(base);
-    QDir().mkpath(folder);
-    return folder + "/jobs-XXXXXX";
-}
-
-Error errorOf(const std::function<void()>& f)
-{
-    try {
-        f();
-    } catch (const Error& e) {
-        return e;
-    }
-    ADD_FAILURE() << "no error was raised";
-    return Error(0, "");
-}
 
 void exec(const std::string& path, const std::string& sql)
 {
@@ -119,7 +101,7 @@ protected:
         return out;
     }
 
-    QTemporaryDir dir_{tempTemplate()};
+    QTemporaryDir dir_{test::tempTemplate("jobs")};
     std::string path_;
     Variant jobs_;
 };
@@ -204,7 +186,7 @@ TEST_F(JobData, QueryThatWritesIsRefused)
     call(jobs_, "SetFromDate", {isoDate("2025-01-01")});
     call(jobs_, "SetToDate", {isoDate("2027-01-01")});
     Args args{"DELETE FROM jobs", Variant(), int32_t{0}, "", int32_t{0}};
-    const Error e = errorOf([&] { call(jobs_, "FetchJobRows", args); });
+    const Error e = test::errorOf([&] { call(jobs_, "FetchJobRows", args); });
     EXPECT_EQ(e.number(), errc::HostBase + hosterr::JobData);
     EXPECT_EQ(statuses(isoDate("2025-01-01"), isoDate("2027-01-01")).size(), 5u);
 }
@@ -212,13 +194,13 @@ TEST_F(JobData, QueryThatWritesIsRefused)
 TEST_F(JobData, OtherQueryOptionIsRefused)
 {
     Args args{int32_t{1}, ""};
-    EXPECT_EQ(errorOf([&] { call(jobs_, "GetJobQuery", args); }).number(), errc::InvalidProcedureCall);
+    EXPECT_EQ(test::errorOf([&] { call(jobs_, "GetJobQuery", args); }).number(), errc::InvalidProcedureCall);
 }
 
 TEST_F(JobData, FetchWithoutDatesIsAnError)
 {
     Args args{query(), Variant(), int32_t{0}, "", int32_t{0}};
-    const Error e = errorOf([&] { call(jobs_, "FetchJobRows", args); });
+    const Error e = test::errorOf([&] { call(jobs_, "FetchJobRows", args); });
     EXPECT_EQ(e.number(), errc::HostBase + hosterr::JobData);
     EXPECT_NE(e.description().find("SetFromDate"), std::string::npos) << e.description();
 }
@@ -226,7 +208,7 @@ TEST_F(JobData, FetchWithoutDatesIsAnError)
 TEST_F(JobData, DateOfAnotherKindIsATypeMismatch)
 {
     for (const Variant& v : {Variant::null(), Variant(), Variant(VariantArray(0, 0, 0, 0))})
-        EXPECT_EQ(errorOf([&] { call(jobs_, "SetFromDate", {v}); }).number(), errc::TypeMismatch);
+        EXPECT_EQ(test::errorOf([&] { call(jobs_, "SetFromDate", {v}); }).number(), errc::TypeMismatch);
 }
 
 struct BadDatabaseCase {
@@ -244,7 +226,7 @@ TEST_P(UnusableDatabase, FailsTheFetchNamingTheFile)
     call(jobs_, "SetFromDate", {isoDate("2026-01-01")});
     call(jobs_, "SetToDate", {isoDate("2026-01-31")});
     Args args{query(), Variant(), int32_t{0}, "", int32_t{0}};
-    const Error e = errorOf([&] { call(jobs_, "FetchJobRows", args); });
+    const Error e = test::errorOf([&] { call(jobs_, "FetchJobRows", args); });
     EXPECT_EQ(e.number(), GetParam().number);
     EXPECT_NE(e.description().find(path), std::string::npos) << e.description();
 }
@@ -280,16 +262,16 @@ TEST_F(JobData, NoDatabaseConfiguredIsAnError)
     call(jobs_, "SetFromDate", {isoDate("2026-01-01")});
     call(jobs_, "SetToDate", {isoDate("2026-01-31")});
     Args args{query(), Variant(), int32_t{0}, "", int32_t{0}};
-    const Error e = errorOf([&] { call(jobs_, "FetchJobRows", args); });
+    const Error e = test::errorOf([&] { call(jobs_, "FetchJobRows", args); });
     EXPECT_EQ(e.number(), errc::HostBase + hosterr::JobData);
     EXPECT_NE(e.description().find("No jobs database"), std::string::npos) << e.description();
 }
 
 TEST_F(JobData, WrongArgumentCountsAreRefused)
 {
-    EXPECT_EQ(errorOf([&] { call(jobs_, "SetFromDate"); }).number(), errc::WrongArgumentCount);
-    EXPECT_EQ(errorOf([&] { call(jobs_, "GetJobQuery", {int32_t{255}}); }).number(), errc::WrongArgumentCount);
-    EXPECT_EQ(errorOf([&] { call(jobs_, "FetchJobRows", {query(), Variant(), int32_t{0}, ""}); }).number(),
+    EXPECT_EQ(test::errorOf([&] { call(jobs_, "SetFromDate"); }).number(), errc::WrongArgumentCount);
+    EXPECT_EQ(test::errorOf([&] { call(jobs_, "GetJobQuery", {int32_t{255}}); }).number(), errc::WrongArgumentCount);
+    EXPECT_EQ(test::errorOf([&] { call(jobs_, "FetchJobRows", {query(), Variant(), int32_t{0}, ""}); }).number(),
               errc::WrongArgumentCount);
 }
 

@@ -14,30 +14,12 @@
 #include "core/Error.h"
 #include "host/RawIni.h"
 #include "host/TestStand.h"
+#include "HostTestSupport.h"
 
 using namespace kg;
 using namespace kg::host::teststand;
 
 namespace {
-
-QString tempTemplate()
-{
-    const QByteArray base = qgetenv("KG_TEST_TMP");
-    const QString folder = base.isEmpty() ? QDir::tempPath() : QString::fromLocal8Bit(base);
-    QDir().mkpath(folder);
-    return folder + "/settings-XXXXXX";
-}
-
-Error errorOf(const std::function<void()>& f)
-{
-    try {
-        f();
-    } catch (const Error& e) {
-        return e;
-    }
-    ADD_FAILURE() << "no error was raised";
-    return Error(0, "");
-}
 
 QByteArray fileBytes(const std::string& path)
 {
@@ -80,7 +62,7 @@ protected:
         call(settings_, "WriteSetting", args);
     }
 
-    QTemporaryDir dir_{tempTemplate()};
+    QTemporaryDir dir_{test::tempTemplate("settings")};
     std::string path_;
     Variant settings_;
 };
@@ -210,7 +192,7 @@ TEST_F(SettingsStore, WriteIntoAFileUsedAsFolderFails)
     writeBytes(path_, "[Tavix]\n");
     config().settingsFile = path_ + "/settings.ini";
     settings_ = Variant(makeFactory()->create(host::HostClass::Settings));
-    const Error e = errorOf([&] { write("2dCharts", "Style", "Pie"); });
+    const Error e = test::errorOf([&] { write("2dCharts", "Style", "Pie"); });
     EXPECT_EQ(e.number(), errc::HostBase + hosterr::Settings);
     EXPECT_NE(e.description().find(config().settingsFile), std::string::npos) << e.description();
     EXPECT_EQ(fileBytes(path_), "[Tavix]\n");
@@ -227,7 +209,7 @@ TEST_F(SettingsStore, FailedWriteLeavesThePreviousFile)
     rlimit tiny = saved;
     tiny.rlim_cur = 200;
     ASSERT_EQ(setrlimit(RLIMIT_FSIZE, &tiny), 0);
-    const Error e = errorOf([&] { write("2dCharts", "Rotation", std::string(1000, 'x')); });
+    const Error e = test::errorOf([&] { write("2dCharts", "Rotation", std::string(1000, 'x')); });
     setrlimit(RLIMIT_FSIZE, &saved);
     std::signal(SIGXFSZ, oldHandler);
     EXPECT_EQ(e.number(), errc::HostBase + hosterr::Settings);
@@ -240,10 +222,10 @@ TEST_F(SettingsStore, FailedWriteLeavesThePreviousFile)
 TEST_F(SettingsStore, FolderAtTheFilesPlaceFailsReadAndWrite)
 {
     ASSERT_TRUE(QDir().mkpath(QString::fromStdString(path_)));
-    const Error r = errorOf([&] { read("2dCharts", "Style"); });
+    const Error r = test::errorOf([&] { read("2dCharts", "Style"); });
     EXPECT_EQ(r.number(), errc::HostBase + hosterr::Settings);
     EXPECT_NE(r.description().find(path_), std::string::npos) << r.description();
-    const Error w = errorOf([&] { write("2dCharts", "Style", "Pie"); });
+    const Error w = test::errorOf([&] { write("2dCharts", "Style", "Pie"); });
     EXPECT_EQ(w.number(), errc::HostBase + hosterr::Settings);
     EXPECT_NE(w.description().find(path_), std::string::npos) << w.description();
 }
@@ -270,7 +252,7 @@ TEST_P(SettingsBadArguments, AreRefused)
 {
     for (const char* member : {"ReadSetting", "WriteSetting"}) {
         Args args = GetParam().args;
-        EXPECT_EQ(errorOf([&] { call(settings_, member, args); }).number(), GetParam().number) << member;
+        EXPECT_EQ(test::errorOf([&] { call(settings_, member, args); }).number(), GetParam().number) << member;
     }
     EXPECT_FALSE(QFile::exists(QString::fromStdString(path_)));
 }
