@@ -176,6 +176,7 @@ int runGallery(int argc, char** argv)
         }
         entries.push_back(entry);
     }
+    kg::cli::shutdownComponent();
     try {
         writeIndex(folder, entries);
     } catch (const kg::Error& e) {

@@ -147,6 +147,9 @@ int runRender(int argc, char** argv)
 
     kg::cli::installOffscreenComponent();
     const kg::cli::RequestResult result = kg::cli::runRequest(kg::Variant(form), o.call);
+    struct Shutdown {
+        ~Shutdown() { kg::cli::shutdownComponent(); }
+    } shutdown;
     switch (result.outcome) {
     case kg::cli::Outcome::Failed:
         std::fprintf(stderr, "karstgraph render: %s failed: %s\n", o.call.request.c_str(), result.text.c_str());

@@ -1,6 +1,8 @@
 #include "apps/cli/RequestRunner.h"
 
+#include <QApplication>
 #include <QDialog>
+#include <QWidget>
 #include <QPushButton>
 #include <QRadioButton>
 #include <cstring>
@@ -56,6 +58,17 @@ void installOffscreenComponent()
     auto prompter = std::make_unique<ui::ScriptedPrompter>();
     g_prompter = prompter.get();
     ui::setPrompter(std::move(prompter));
+}
+
+void shutdownComponent()
+{
+    // A window left open would outlive the application object; close it as a user would
+    // (the chart window deletes itself on close).
+    for (QWidget* w : QApplication::topLevelWidgets())
+        if (w->isWindow() && !w->parentWidget()) w->close();
+    modMain::releaseSharedObjects();
+    modMain::gvSourceForm = Variant();
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
 }
 
 bool isRequestName(const std::string& name)

@@ -26,6 +26,8 @@ struct RequestResult {
 
 // Once per process, before the first request: a QApplication must exist.
 void installOffscreenComponent();
+// Before the application object goes: unloads the chart window and releases what the component holds.
+void shutdownComponent();
 
 bool isRequestName(const std::string& name);
 bool takesGridArguments(const std::string& request);
