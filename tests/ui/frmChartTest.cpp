@@ -43,6 +43,7 @@ struct WindowFixture : test::RequestFixture {
     void TearDown() override
     {
         if (qtUi && qtUi->chartWindow()) qtUi->chartWindow()->close();
+        QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);  // the window deletes itself
         control::setPrintToPdfFile("");
         ui::setPrompter(std::make_unique<ui::QtPrompter>());
         test::RequestFixture::TearDown();
