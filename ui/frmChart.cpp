@@ -103,8 +103,10 @@ void frmChart::runCommand(const std::function<void()>& command)
     try {
         command();
     } catch (const Error& e) {
+        HourglassOff();  // a failed Redraw must hand the pointer back, as a failed request does
         prompter().showMessage("Error " + std::to_string(e.number()) + ": " + e.description());
     } catch (const std::exception& e) {
+        HourglassOff();
         prompter().showMessage(std::string("Error: ") + e.what());
     }
 }
