@@ -92,6 +92,9 @@ ChartControl::ChartControl() : data_(*this) {}
 
 ChartLabel& ChartControl::addChartLabel()
 {
+    if (chartLabels.size() >= kMaxLabels)
+        throw Error(errc::OutOfMemory, "Out of memory: the chart holds at most " + std::to_string(kMaxLabels) +
+                                           " labels");
     chartLabels.emplace_back();
     changed();
     return chartLabels.back();

@@ -81,7 +81,7 @@ class ChartData {
 public:
     // Limits that keep a wild count from exhausting memory: beyond them the control refuses.
     static constexpr int32_t kMaxSeries = 1 << 20;
-    static constexpr int64_t kMaxPoints = int64_t(1) << 26;  // all series together
+    static constexpr int64_t kMaxPoints = int64_t(1) << 24;  // all series together (256 MB)
 
     explicit ChartData(ChartControl& owner) : owner_(owner) {}
 
@@ -187,6 +187,9 @@ public:
     const ChartData& data() const { return data_; }
 
     // Chart label collection: add returns the new label (valid until the next add or clear).
+    // Beyond kMaxLabels adding fails with Error 7: a label per cell of a huge table would take
+    // more memory than the data and could not be read anyway.
+    static constexpr size_t kMaxLabels = 65536;
     ChartLabel& addChartLabel();
     void clearChartLabels();
 
