@@ -1,6 +1,7 @@
 #include "host/RawIni.h"
 
 #include <QIODevice>
+#include <QStringDecoder>
 
 namespace kg::host::teststand::rawini {
 
@@ -10,6 +11,7 @@ bool isBlank(char c) { return c == ' ' || c == '\t' || c == '\n' || c == '\r'; }
 bool isSpecial(char c) { return c == '\n' || c == '\r' || c == '"' || c == ';' || c == '=' || c == '\\'; }
 bool isHexDigit(char c) { return (c >= '0' && c <= '9') || (c >= 'a' && c <= 'f') || (c >= 'A' && c <= 'F'); }
 int hexValue(char c) { return c <= '9' ? c - '0' : (c | 0x20) - 'a' + 10; }
+
 
 struct Line {
     int start = 0;
@@ -70,6 +72,12 @@ QString normalizedKey(const QString& key)
 }
 
 }  // namespace
+
+QString fromUtf8Text(QByteArrayView bytes)
+{
+    QStringDecoder decoder(QStringDecoder::Utf8, QStringDecoder::Flag::Stateless | QStringDecoder::Flag::ConvertInitialBom);
+    return decoder.decode(bytes);
+}
 
 QByteArray escapeValue(const QString& input)
 {
@@ -176,7 +184,7 @@ QString unescapeValue(const QByteArray& raw, bool* stored)
         } else {
             int j = i + 1;
             while (j < n && raw[j] != '\\' && raw[j] != '"') ++j;
-            out += QString::fromUtf8(raw.constData() + i, j - i);
+            out += fromUtf8Text(QByteArrayView(raw.constData() + i, j - i));
             i = j;
         }
     }
@@ -250,7 +258,7 @@ QString unescapeKey(const QByteArray& raw)
         // Plain bytes up to the next escape, read as UTF-8 (a hand-written key may hold any text).
         int j = i + 1;
         while (j < n && raw[j] != '\\' && raw[j] != '%') ++j;
-        out += QString::fromUtf8(raw.constData() + i, j - i);
+        out += fromUtf8Text(QByteArrayView(raw.constData() + i, j - i));
         i = j;
     }
     return out;
@@ -305,7 +313,13 @@ bool writeFile(QIODevice& device, const Entries& map)
     if (!general.isEmpty()) out += "[General]\n" + general;
     for (auto it = sections.constBegin(); it != sections.constEnd(); ++it) {
         if (!out.isEmpty()) out += '\n';
-        const QByteArray name = it.key() == QLatin1String("General") ? QByteArray("%General") : escapeKey(it.key());
+        // A section named like IniFormat's keyless [General] in any case gets its first letter
+        // escaped, or it would read back as keys without a section.
+        QByteArray name = escapeKey(it.key());
+        if (it.key() == QLatin1String("General"))
+            name = "%General";
+        else if (it.key().compare(QLatin1String("general"), Qt::CaseInsensitive) == 0)
+            name = QByteArray("%") + QByteArray::number(it.key().at(0).unicode(), 16).toUpper() + name.mid(1);
         out += '[' + name + "]\n" + it.value();
     }
     return device.write(out) == out.size();

@@ -8,11 +8,16 @@
 // as text, with the blanks around it. Comments in a hand-edited file do not survive a write, as
 // with IniFormat.
 #include <QByteArray>
+#include <QByteArrayView>
 #include <QIODevice>
 #include <QMap>
 #include <QString>
 
 namespace kg::host::teststand::rawini {
+
+// UTF-8 to text, keeping a U+FEFF at the start: QString::fromUtf8 drops it as a byte order mark,
+// but inside a stored key or value it is a character like any other.
+QString fromUtf8Text(QByteArrayView bytes);
 
 // Keys "Section/Key/..." to their texts.
 using Entries = QMap<QString, QString>;

@@ -41,7 +41,7 @@ SettingsFile::SettingsFile(std::string path) : path_(std::move(path)) {}
 std::optional<std::string> SettingsFile::read(const std::string& key) const
 {
     const rawini::Entries entries = readEntries(path_);
-    auto it = entries.constFind(QString::fromStdString(key));
+    auto it = entries.constFind(rawini::fromUtf8Text(key));
     if (it == entries.constEnd()) return std::nullopt;
     return it.value().toStdString();
 }
@@ -64,7 +64,7 @@ void SettingsFile::write(const std::vector<std::pair<std::string, std::string>>&
     // Read under the lock, so a write of another program in between is kept. A file that cannot
     // be read is not written: the write would drop what it holds.
     rawini::Entries all = readEntries(path_);
-    for (const auto& [key, value] : entries) all.insert(QString::fromStdString(key), QString::fromStdString(value));
+    for (const auto& [key, value] : entries) all.insert(rawini::fromUtf8Text(key), rawini::fromUtf8Text(value));
 
     // Unbuffered, so a short write (a full disk) shows in write()'s count: a buffered QSaveFile
     // loses it at close and commits the cut file.
