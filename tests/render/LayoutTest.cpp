@@ -23,6 +23,34 @@ ChartControl& barChart(ChartControl& c, int series, int points)
     return c;
 }
 
+struct DisplayTextCase {
+    const char* name;
+    std::string stored;
+    QString shown;
+};
+
+class DisplayTextTest : public ::testing::TestWithParam<DisplayTextCase> {};
+
+TEST_P(DisplayTextTest, ShowsTheStoredTextWithoutWhatHasNoGlyph)
+{
+    EXPECT_EQ(displayText(GetParam().stored), GetParam().shown);
+}
+
+const std::string kLongCaption(1 << 20, 'x');
+// 1999 letters and a character outside the basic plane (two UTF-16 units) across the cut.
+const std::string kCutInAPair = std::string(1999, 'a') + "\xF0\x9F\x98\x80" + "tail";
+
+INSTANTIATE_TEST_SUITE_P(
+    Texts, DisplayTextTest,
+    ::testing::Values(DisplayTextCase{"leadingBlanksKept", "  Total ", "  Total "},
+                      DisplayTextCase{"lineBreaksAndTabsAsBlanks", "a\r\nb\tc", "a  b c"},
+                      DisplayTextCase{"otherControlsDropped", "a\x01" "b\x1F" "c", "abc"},
+                      DisplayTextCase{"nonLatinKept", "\xD0\x98\xD1\x82\xD0\xBE\xD0\xB3 \xE5\x90\x88\xE8\xA8\x88",
+                                      QString::fromUtf8("\xD0\x98\xD1\x82\xD0\xBE\xD0\xB3 \xE5\x90\x88\xE8\xA8\x88")},
+                      DisplayTextCase{"megabyteCutToWhatAPageShows", kLongCaption, QString(2000, QLatin1Char('x'))},
+                      DisplayTextCase{"cutNeverSplitsACharacter", kCutInAPair, QString(1999, QLatin1Char('a'))}),
+    [](const auto& info) { return std::string(info.param.name); });
+
 TEST(LayoutTest, HeaderAndFooterAreCentredAtTheEnds)
 {
     ChartControl c;

@@ -9,11 +9,21 @@ namespace {
 constexpr double kPixelsPerPoint = 96.0 / 72.0;
 constexpr double kAxisTitlePoints = 9;
 constexpr double kSmallPoints = 8;
+// More characters than any page can show in one line at the smallest font: the rest is cut
+// before measuring, or a megabyte caption would be shaped in full on every paint.
+constexpr qsizetype kMostShownCharacters = 2000;
 }  // namespace
 
 QString displayText(const std::string& text)
 {
-    QString s = QString::fromStdString(text);
+    // A byte beyond the shown characters' longest UTF-8 form cannot be shown either.
+    const size_t bytes = std::min(text.size(), size_t(kMostShownCharacters) * 4);
+    QString s = QString::fromUtf8(text.data(), qsizetype(bytes));
+    if (s.size() > kMostShownCharacters) {
+        qsizetype keep = kMostShownCharacters;
+        if (s.at(keep - 1).isHighSurrogate()) --keep;  // never half a character
+        s.truncate(keep);
+    }
     bool clean = true;
     for (QChar c : s) {
         if (c.unicode() < 0x20) {

@@ -12,7 +12,8 @@
 namespace kg::control {
 
 // A stored text as shown: exactly as stored (leading blanks included); control characters have
-// no glyph, so line breaks and tabs show as blanks and the rest are dropped.
+// no glyph, so line breaks and tabs show as blanks and the rest are dropped. Only the first 2000
+// characters are kept: no page shows more in one line.
 QString displayText(const std::string& text);
 
 // A font of `points` at 96 dpi in the chart's sans family.
