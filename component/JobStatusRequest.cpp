@@ -72,9 +72,11 @@ void countRow(CellTexts& texts, const VariantArray& rows, int32_t r, VariantArra
     if (field(59) == 1) hit(8);
     if (field(45) == 1) hit(9);
     if (field(52) == 1) hit(10);
-    // Both halves are read, as the host expects each field number to be asked for.
-    if ((field(64) == 0) & (field(46) == 1)) hit(11);
-    if ((field(64) == 1) & (field(46) == 1)) hit(12);
+    // Both halves are read (no short-circuit), as the host expects each field number to be asked for.
+    const bool cleared = field(64) == 0, flagged = field(46) == 1;
+    if (cleared && flagged) hit(11);
+    const bool closed = field(64) == 1, flaggedAgain = field(46) == 1;
+    if (closed && flaggedAgain) hit(12);
     if (texts.statusText(status) == "Imported") hit(13);
 }
 
