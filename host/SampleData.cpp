@@ -131,7 +131,10 @@ SampleData writeSampleData(const std::string& folder)
         typeJobs[b.type] += b.job;
         jobsTotal += b.job;
     }
-    QJsonArray g1{monthHeader("Agent")}, g2{monthHeader("Agent")}, g3{monthHeader("Agent")};
+    // Rows appended one by one: a brace list of one array is a copy of it for one compiler and
+    // an array holding it for another.
+    QJsonArray g1, g2, g3;
+    for (QJsonArray* g : {&g1, &g2, &g3}) g->append(monthHeader("Agent"));
     for (int a = 0; a < kAgentCount; ++a) {
         QJsonArray r1{kAgents[a]}, r2{kAgents[a]}, r3{kAgents[a]};
         double c = 0, v = 0;
@@ -154,7 +157,8 @@ SampleData writeSampleData(const std::string& folder)
     data.totals.value = round2(data.totals.value);
     data.totals.average = data.totals.quantity > 0 ? round2(data.totals.value / data.totals.quantity) : 0;
 
-    QJsonArray settings{QJsonArray{"Quote Type", "Qty", "Value", "Avg Value", "Pct Jobs", "Pct Value"}};
+    QJsonArray settings;
+    settings.append(QJsonArray{"Quote Type", "Qty", "Value", "Avg Value", "Pct Jobs", "Pct Value"});
     for (int t = 0; t < kTypeCount; ++t)
         settings.append(QJsonArray{kQuoteTypes[t], typeCount[t], round2(typeValue[t]),
                                    typeCount[t] > 0 ? round2(typeValue[t] / typeCount[t]) : 0.0,
