@@ -5,12 +5,14 @@
 #include <cstdio>
 #include <cstring>
 #include <string>
+#include <vector>
 
 #include "apps/cli/Commands.h"
 #include "apps/cli/RequestRunner.h"
 #include "component/UiServices.h"
 #include "core/Convert.h"
 #include "core/Error.h"
+#include "host/FaultPlan.h"
 #include "host/TestStand.h"
 
 namespace {
@@ -19,16 +21,26 @@ constexpr int kWritten = 0, kFailed = 1, kUsage = 2, kMessage = 3;
 
 const char* const kUsageText =
     "usage: karstgraph render FORM.json REQUEST [--series N] [--total VALUE|empty] [--choice N]\n"
-    "                         [--settings FILE.ini] [--jobs FILE.db] [--size WxH] -o OUT.png|OUT.svg|OUT.pdf\n"
+    "                         [--settings FILE.ini] [--jobs FILE.db] [--size WxH] [--fail OPERATION:N]\n"
+    "                         -o OUT.png|OUT.svg|OUT.pdf\n"
     "  REQUEST   one of the thirteen GenerateChart_* requests, e.g. GenerateChart_PropGraph1\n"
     "  --series  lNumSeries (default: the grid's data rows)\n"
     "  --total   vTotal: a number, or 'empty' for an Empty total (default 0)\n"
     "  --choice  answer of the data choice dialog: 0 to 6, or -99 to cancel (measure requests only)\n"
     "  --jobs    the jobs database (default: the form file's \"jobsDatabase\")\n"
+    "  --fail    the host fails the N-th call of OPERATION, e.g. Grid.textmatrix:3 or Settings.WriteSetting:1\n"
+    "            (repeatable; operations as kind.member: AppServices, Settings, JobData, Form, Grid,\n"
+    "            Picker, List, Factory)\n"
     "exit status: 0 chart written, 1 request failed, 2 bad usage or input, 3 a message instead of a chart\n";
+
+struct PlannedFailure {
+    std::string operation;
+    int call = 0;
+};
 
 struct Options {
     std::string form, output, settings, jobs;
+    std::vector<PlannedFailure> failures;
     kg::cli::RequestCall call;
     int width = 800, height = 600;
 };
@@ -92,6 +104,13 @@ std::optional<int> parse(int argc, char** argv, Options& o)
             const char* v = value();
             if (!v) return usage(a + " needs a file name");
             (a == "--jobs" ? o.jobs : o.settings) = v;
+        } else if (a == "--fail") {
+            const char* v = value();
+            const char* colon = v ? std::strrchr(v, ':') : nullptr;
+            int n = 0;
+            if (!colon || colon == v || !std::strchr(v, '.') || !parseWhole(colon + 1, n) || n < 1)
+                return usage("--fail takes OPERATION:N, e.g. Grid.textmatrix:3, with N from 1");
+            o.failures.push_back({std::string(v, colon), n});
         } else if (a == "--size") {
             const char* v = value();
             int w = 0, h = 0;
@@ -146,6 +165,7 @@ int runRender(int argc, char** argv)
     stand.jobsDatabase = !o.jobs.empty() ? o.jobs : kg::host::teststand::jobsDatabaseOf(form);
 
     kg::cli::installOffscreenComponent();
+    for (const PlannedFailure& f : o.failures) kg::host::teststand::FaultPlan::failOn(f.operation, f.call);
     const kg::cli::RequestResult result = kg::cli::runRequest(kg::Variant(form), o.call);
     struct Shutdown {
         ~Shutdown() { kg::cli::shutdownComponent(); }

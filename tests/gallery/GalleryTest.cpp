@@ -89,4 +89,48 @@ TEST_F(Gallery, ChartsCarryTheirHeaders)
     EXPECT_TRUE(QString::fromUtf8(jobs.readAll()).contains("Tavix Job Status Chart"));
 }
 
+// `karstgraph render` on the gallery's sample form, with host failures planned by --fail: the
+// request fails with the injected description, nothing is written, and the same request without
+// the plan charts.
+struct RenderCase {
+    const char* name;
+    QStringList options;
+    int exitCode;
+    const char* says;  // on standard error
+};
+
+class Render : public Gallery, public ::testing::WithParamInterface<RenderCase> {};
+
+TEST_P(Render, FailsAsPlannedOrCharts)
+{
+    ASSERT_EQ(exitCode, 0);
+    const RenderCase& c = GetParam();
+    const QString out = dir->filePath(QString("render-%1.png").arg(c.name));
+    QProcess p;
+    QProcessEnvironment env = QProcessEnvironment::systemEnvironment();
+    env.insert("XDG_CONFIG_HOME", dir->filePath("config"));
+    p.setProcessEnvironment(env);
+    p.start(tool(), QStringList{"render", file("sample/form.json"), "GenerateChart_HourlyGraph1", "-o", out,
+                                "--settings", dir->filePath("render.ini")} + c.options);
+    ASSERT_TRUE(p.waitForFinished(60000));
+    const QString err = QString::fromUtf8(p.readAllStandardError());
+    EXPECT_EQ(p.exitCode(), c.exitCode) << err.toStdString();
+    EXPECT_TRUE(err.contains(c.says)) << err.toStdString();
+    EXPECT_EQ(QFile::exists(out), c.exitCode == 0);
+}
+
+INSTANTIATE_TEST_SUITE_P(
+    Plans, Render,
+    ::testing::Values(
+        RenderCase{"noPlan", {}, 0, ""},
+        RenderCase{"gridCell", {"--fail", "Grid.textmatrix:3"}, 1, "Injected failure of Grid.textmatrix (call 3)"},
+        RenderCase{"settingsRead", {"--fail", "Settings.ReadSetting:1"}, 1,
+                   "Injected failure of Settings.ReadSetting (call 1)"},
+        // A plan on a call that never comes changes nothing.
+        RenderCase{"callNeverMade", {"--fail", "Grid.textmatrix:1000000"}, 0, ""},
+        RenderCase{"noCallNumber", {"--fail", "Grid.textmatrix"}, 2, "--fail takes OPERATION:N"},
+        RenderCase{"callZero", {"--fail", "Grid.textmatrix:0"}, 2, "--fail takes OPERATION:N"},
+        RenderCase{"noKind", {"--fail", "textmatrix:3"}, 2, "--fail takes OPERATION:N"}),
+    [](const auto& info) { return std::string(info.param.name); });
+
 }  // namespace
