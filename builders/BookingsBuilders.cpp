@@ -1,5 +1,6 @@
 #include "builders/BookingsBuilders.h"
 
+#include "builders/ChartFrame.h"
 #include "builders/LateBoundGrid.h"
 #include "component/modMain.h"
 #include "core/Convert.h"
@@ -16,6 +17,12 @@ std::string dateRange()
            formatPattern(datePickerValue(gvSourceForm, "dtpToDate"), "DD/MM/YYYY");
 }
 
+// One point per data row of the settings grid.
+std::function<int32_t()> dataRowsOf(LateBoundGrid& grid)
+{
+    return [&grid] { return toLong(Variant(double(grid.Rows()) - grid.FixedRows())); };
+}
+
 }  // namespace
 
 void DrawBookingsGraph(const std::string& sHeader, const std::string& sYTitle, const int32_t& lMeasureCol)
@@ -23,28 +30,16 @@ void DrawBookingsGraph(const std::string& sHeader, const std::string& sYTitle, c
     HourglassOn();
     LateBoundGrid grid(call(gvSourceForm, "gridsettings1"));
     const std::string xTitle = dateRange();
-    c2dChart& c = chart();
     ChartWindowPort& window = chartWindow();
-    c.Initialize(&window.Chart1(), sHeader, "", xTitle, sYTitle);
-    c2dChart::setShowLegend(false);
-    c.setNumSeries(1);
-    c.setXMinData(1);
-    c.setXMaxData(toLong(Variant(double(grid.Rows()) - grid.FixedRows())));
-    c.InitChart();
-    gvArray.redim(c.NumSeries(), c.NumPoints());
-    c.setXAxisLabels(false);
+    c2dChart& c = prepareChart(window, {sHeader, xTitle, sYTitle, 1, false}, dataRowsOf(grid));
 
     control::ChartControl& chart1 = window.Chart1();
-    chart1.group1.pointLabels.clear();
     for (int32_t r = grid.FixedRows(), rows = grid.Rows(); r < rows; ++r)
         chart1.group1.pointLabels.push_back(toText(grid.GetValueFromCell(r, 0)));
     chart1.chartArea.x.annotationMethod = 2;
     for (int32_t r = grid.FixedRows(), rows = grid.Rows(); r < rows; ++r)
         gvArray.at(1, r - grid.FixedRows() + 1) = grid.GetValueFromCell(r, lMeasureCol);
-    HourglassOff();
-    window.setRedrawVisible(true);
-    window.Show();
-    c.DrawChart(gvArray);
+    showChart(window, c, true);
 }
 
 void DrawBookingsDualGraph(const std::string& sHeader, const int32_t& lMeasureCol1, const int32_t& lMeasureCol2)
@@ -52,19 +47,10 @@ void DrawBookingsDualGraph(const std::string& sHeader, const int32_t& lMeasureCo
     HourglassOn();
     LateBoundGrid grid(call(gvSourceForm, "gridsettings1"));
     const std::string xTitle = dateRange();
-    c2dChart& c = chart();
     ChartWindowPort& window = chartWindow();
-    c.Initialize(&window.Chart1(), sHeader, "", xTitle, "");
-    c.setNumSeries(2);
-    c2dChart::setShowLegend(true);
-    c.setXMinData(1);
-    c.setXMaxData(toLong(Variant(double(grid.Rows()) - grid.FixedRows())));
-    c.InitChart();
-    gvArray.redim(c.NumSeries(), c.NumPoints());
-    c.setXAxisLabels(false);
+    c2dChart& c = prepareChart(window, {sHeader, xTitle, "", 2, true}, dataRowsOf(grid));
 
     control::ChartControl& chart1 = window.Chart1();
-    chart1.group1.pointLabels.clear();
     chart1.group1.seriesLabels.clear();
     chart1.group1.seriesLabels.push_back(toText(grid.GetValueFromCell(0, lMeasureCol1)));
     chart1.group1.seriesLabels.push_back(toText(grid.GetValueFromCell(0, lMeasureCol2)));
@@ -75,10 +61,7 @@ void DrawBookingsDualGraph(const std::string& sHeader, const int32_t& lMeasureCo
         gvArray.at(1, r - grid.FixedRows() + 1) = grid.GetValueFromCell(r, lMeasureCol1);
         gvArray.at(2, r - grid.FixedRows() + 1) = grid.GetValueFromCell(r, lMeasureCol2);
     }
-    HourglassOff();
-    window.setRedrawVisible(true);
-    window.Show();
-    c.DrawChart(gvArray);
+    showChart(window, c, true);
 }
 
 }  // namespace kg::builders

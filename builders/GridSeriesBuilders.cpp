@@ -1,5 +1,6 @@
 #include "builders/GridSeriesBuilders.h"
 
+#include "builders/ChartFrame.h"
 #include "builders/LateBoundGrid.h"
 #include "component/modMain.h"
 #include "core/Convert.h"
@@ -23,19 +24,11 @@ void drawGridSeries(const Variant& vGrid, const std::string& sHeader, const std:
 {
     LateBoundGrid grid(vGrid);
     HourglassOn();
-    c2dChart& c = chart();
     ChartWindowPort& window = chartWindow();
-    c.Initialize(&window.Chart1(), sHeader, "", "Month", sYTitle);
-    c.setNumSeries(lNumSeries);
-    c2dChart::setShowLegend(true);
-    c.setXMinData(1);
-    c.setXMaxData(lastPoint(grid, points));
-    c.InitChart();
-    gvArray.redim(c.NumSeries(), c.NumPoints());
-    c.setXAxisLabels(false);
+    c2dChart& c = prepareChart(window, {sHeader, "Month", sYTitle, lNumSeries, true},
+                               [&] { return lastPoint(grid, points); });
 
     control::ChartControl& chart1 = window.Chart1();
-    chart1.group1.pointLabels.clear();
     chart1.group1.seriesLabels.clear();
     {
         const int32_t fixedRows = grid.FixedRows(), rows = grid.Rows();
@@ -52,10 +45,7 @@ void drawGridSeries(const Variant& vGrid, const std::string& sHeader, const std:
         for (int32_t col = 1, last = lastPoint(grid, points); col <= last; ++col)
             gvArray.at(series, col) = Variant(grid.textmatrix(r, col));
     }
-    HourglassOff();
-    window.setRedrawVisible(false);
-    window.Show();
-    c.DrawChart(gvArray);
+    showChart(window, c, false);
 }
 
 }  // namespace
