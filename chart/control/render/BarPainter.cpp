@@ -12,17 +12,11 @@ namespace {
 constexpr double kOutlineFrom = 4;  // bars narrower than this get no outline
 constexpr double kFacesFrom = 2;    // nor 3-D faces, which would not show
 
-QRectF seriesClip(const ChartLayout& L)
-{
-    const QRectF front = L.plotArea;
-    return front.united(front.translated(L.depth));
-}
-
 // The part of the bars' room that the view shows (all of it unless scaled, moved or zoomed), in
 // the chart's own coordinates: a bar outside it would cost its rasterising and show nothing.
 QRectF shownPart(const ChartLayout& L)
 {
-    const QRectF room = seriesClip(L);
+    const QRectF room = L.seriesArea();
     if (L.view.isIdentity()) return room;
     bool invertible = false;
     const QTransform back = L.view.inverted(&invertible);
@@ -32,13 +26,7 @@ QRectF shownPart(const ChartLayout& L)
 void paintBox(const PaintContext& ctx, const QRectF& r, const QColor& color, bool outline)
 {
     QPainter& p = ctx.painter;
-    const QPointF d = ctx.layout.barDepth;
-    const QPolygonF top = d.y() <= 0
-                              ? QPolygonF({r.topLeft(), r.topLeft() + d, r.topRight() + d, r.topRight()})
-                              : QPolygonF({r.bottomLeft(), r.bottomLeft() + d, r.bottomRight() + d, r.bottomRight()});
-    const QPolygonF side = d.x() >= 0
-                               ? QPolygonF({r.topRight(), r.topRight() + d, r.bottomRight() + d, r.bottomRight()})
-                               : QPolygonF({r.topLeft(), r.topLeft() + d, r.bottomLeft() + d, r.bottomLeft()});
+    const auto [top, side] = ctx.layout.barFaces(r);
     if (!outline) {
         p.setPen(Qt::NoPen);
         p.setBrush(topShade(color));
@@ -75,7 +63,7 @@ void paintBars(const PaintContext& ctx)
     const ChartData& data = ctx.chart.data();
     QPainter& p = ctx.painter;
     p.save();
-    p.setClipRect(seriesClip(L), Qt::IntersectClip);
+    p.setClipRect(L.seriesArea(), Qt::IntersectClip);
     const bool flat = L.depth.isNull();
     const bool outline = L.barWidth >= kOutlineFrom;
     const bool faces = L.barWidth >= kFacesFrom;

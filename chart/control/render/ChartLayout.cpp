@@ -90,6 +90,15 @@ double ChartLayout::xOf(int32_t point) const
     return point;
 }
 
+ChartLayout::BarFaces ChartLayout::barFaces(const QRectF& r) const
+{
+    const QPointF d = barDepth;
+    return {d.y() <= 0 ? QPolygonF({r.topLeft(), r.topLeft() + d, r.topRight() + d, r.topRight()})
+                       : QPolygonF({r.bottomLeft(), r.bottomLeft() + d, r.bottomRight() + d, r.bottomRight()}),
+            d.x() >= 0 ? QPolygonF({r.topRight(), r.topRight() + d, r.bottomRight() + d, r.bottomRight()})
+                       : QPolygonF({r.topLeft(), r.topLeft() + d, r.bottomLeft() + d, r.bottomLeft()})};
+}
+
 QRectF ChartLayout::barRect(const ChartControl& chart, int32_t series, int32_t point) const
 {
     const ChartData& d = chart.data();

@@ -7,6 +7,7 @@
 //   QPointF p = layout.toScreen(3, 120.5);        // device position of point 3, value 120.5
 //   QPointF v; layout.toValue(mousePos, v);       // the data value under the mouse
 #include <QPointF>
+#include <QPolygonF>
 #include <QRectF>
 #include <QString>
 #include <QTransform>
@@ -103,6 +104,14 @@ struct ChartLayout {
     double xOf(int32_t point) const;
     // Front face of the bar of (series, point) (barShift included), or a null box when there is none.
     QRectF barRect(const ChartControl& chart, int32_t series, int32_t point) const;
+    // The faces of a 3-D bar beside its front face: the top (or bottom, seen from below) and the
+    // side towards the back plane.
+    struct BarFaces {
+        QPolygonF top, side;
+    };
+    BarFaces barFaces(const QRectF& front) const;
+    // Where bars and lines are drawn: the plot's front plane and, in 3-D, its back plane.
+    QRectF seriesArea() const { return plotArea.united(plotArea.translated(depth)); }
 };
 
 // The layout for painting the chart into `target`. Sizes are logical pixels and fonts are set in

@@ -86,7 +86,7 @@ void paintLines(const PaintContext& ctx, bool filled)
     const ChartData& data = ctx.chart.data();
     QPainter& p = ctx.painter;
     p.save();
-    p.setClipRect(L.plotArea.united(L.plotArea.translated(L.depth)), Qt::IntersectClip);
+    p.setClipRect(L.seriesArea(), Qt::IntersectClip);
     const QPointF d = L.depth;
     const double base = L.mapping.yPixel(std::clamp(0.0, L.mapping.yMin, L.mapping.yMax));
     if (filled) {

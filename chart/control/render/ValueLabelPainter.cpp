@@ -103,7 +103,7 @@ void paintValueLabels(const PaintContext& ctx)
     QPainter& p = ctx.painter;
     const MeasuredFont& f = ctx.fonts.label;
     // Points hidden by an axis zoom have no label.
-    const QRectF shown = L.kind == ChartKind::Pie ? L.chartContent : L.plotArea.united(L.plotArea.translated(L.depth));
+    const QRectF shown = L.kind == ChartKind::Pie ? L.chartContent : L.seriesArea();
     Occupancy drawn(L.chartContent);
     // What the view shows of the chart (all of it unless scaled, moved or zoomed), in the chart's
     // own coordinates. Labels outside it still take their room, so that moving the chart never

@@ -13,20 +13,11 @@ namespace kg::control {
 namespace {
 constexpr double kPi = 3.14159265358979323846;
 
-// Where bars and lines are drawn: the plot's front plane and, in 3-D, its back plane.
-QRectF seriesArea(const ChartLayout& L) { return L.plotArea.united(L.plotArea.translated(L.depth)); }
-
 // The faces of a 3-D bar beside its front face, as the bar painter draws them.
 bool onBarFaces(const ChartLayout& L, const QRectF& r, QPointF p)
 {
-    const QPointF d = L.barDepth;
-    if (d.isNull()) return false;
-    const QPolygonF top = d.y() <= 0
-                              ? QPolygonF({r.topLeft(), r.topLeft() + d, r.topRight() + d, r.topRight()})
-                              : QPolygonF({r.bottomLeft(), r.bottomLeft() + d, r.bottomRight() + d, r.bottomRight()});
-    const QPolygonF side = d.x() >= 0
-                               ? QPolygonF({r.topRight(), r.topRight() + d, r.bottomRight() + d, r.bottomRight()})
-                               : QPolygonF({r.topLeft(), r.topLeft() + d, r.bottomLeft() + d, r.bottomLeft()});
+    if (L.barDepth.isNull()) return false;
+    const auto [top, side] = L.barFaces(r);
     return top.containsPoint(p, Qt::OddEvenFill) || side.containsPoint(p, Qt::OddEvenFill);
 }
 
@@ -34,7 +25,7 @@ bool onBarFaces(const ChartLayout& L, const QRectF& r, QPointF p)
 // they are tried first.
 std::optional<ChartHit> hitBar(const ChartControl& chart, const ChartLayout& L, QPointF p)
 {
-    if (!seriesArea(L).contains(p)) return std::nullopt;
+    if (!L.seriesArea().contains(p)) return std::nullopt;
     const ChartData& data = chart.data();
     const int32_t seriesCount = data.seriesCount();
     const int32_t points = int32_t(L.xPositions.size());
@@ -55,7 +46,7 @@ std::optional<ChartHit> hitBar(const ChartControl& chart, const ChartLayout& L, 
 std::optional<ChartHit> hitMarker(const ChartControl& chart, const ChartLayout& L, QPointF screen)
 {
     const ChartData& data = chart.data();
-    const QRectF shown = seriesArea(L).adjusted(-0.5, -0.5, 0.5, 0.5);
+    const QRectF shown = L.seriesArea().adjusted(-0.5, -0.5, 0.5, 0.5);
     std::optional<ChartHit> best;
     double bestDistance = kHitRadius;
     for (int32_t s = 1; s <= data.seriesCount(); ++s) {
