@@ -9,14 +9,13 @@
 #include <QImage>
 #include <QMouseEvent>
 #include <QPainter>
-#include <cmath>
 #include <string>
 
+#include "bench/BenchCharts.h"
 #include "chart/control/model/ChartControl.h"
 #include "chart/control/render/ChartLayout.h"
 #include "chart/control/render/ChartPainter.h"
 #include "chart/control/view/ChartView.h"
-#include "core/Convert.h"
 
 using namespace kg::control;
 
@@ -25,58 +24,6 @@ namespace {
 const QSize kSize(1600, 1000);
 // A graphics zoom into the chart's left half, a little moved.
 const ViewState kZoomed{1.8, 0.22, -0.06};
-
-void styleLikeTheChartObject(ChartControl& c)
-{
-    c.header = {"Qty of Bookings: Total = 12345", {10, true}};
-    c.footer.font = {10, true};
-    c.backgroundColor = 12763842;
-    c.border = {6, 7};
-    c.chartArea.backgroundColor = 11788021;
-    c.chartArea.plotArea = {13495295, true};
-    c.chartArea.border = {4, 2};
-    c.chartArea.x.title = "Month";
-    c.chartArea.y.title = "Quantity";
-    c.chartArea.y.presentationCode = 2;
-    c.chartArea.x.annotationMethod = 2;
-    c.chartArea.view3D = {10, 10, 10};  // the stored style's defaults
-    c.legend = {true, 17, 10, 10};
-}
-
-void fillMonthlyReport(ChartControl& c)
-{
-    static const char* months[] = {"January", "February", "March",     "April",   "May",      "June",
-                                   "July",    "August",   "September", "October", "November", "December"};
-    c.group1.chartType = kBar;
-    c.data().setBatched(true);
-    c.data().setSeriesCount(10);
-    for (int s = 1; s <= 10; ++s) {
-        c.data().setPointCount(s, 12);
-        c.group1.seriesLabels.push_back("Series " + std::to_string(s));
-        for (int p = 1; p <= 12; ++p) {
-            c.data().setX(s, p, p);
-            c.data().setY(s, p, std::round(100 + s * 2 + 40 * std::sin(p * 0.05 + s * 0.7)));
-        }
-    }
-    for (const char* m : months) c.group1.pointLabels.push_back(m);
-    // Value labels as the chart object adds them.
-    for (int s = 1; s <= 10; ++s) {
-        for (int p = 1; p <= 12; ++p) {
-            ChartLabel& l = c.addChartLabel();
-            l.text = kg::numberText(c.data().y(s, p));
-            l.name = "LB " + l.text;
-            l.attachMethod = 2;
-            l.series = s;
-            l.point = p;
-            l.offset = 20;
-            l.isConnected = true;
-            l.border = 4;
-            l.borderWidth = 1;
-            l.backgroundColor = 65535;
-        }
-    }
-    c.data().setBatched(false);
-}
 
 // The view, counting its paints so that the benchmark can tell a repaint really happened.
 class CountingView : public ChartView {
@@ -97,8 +44,7 @@ struct Window {
     CountingView view{chart};
     Window()
     {
-        styleLikeTheChartObject(*chart);
-        fillMonthlyReport(*chart);
+        bench::fillMonthlyReport(*chart);
         chart->view = kZoomed;
         view.resize(kSize);
         view.show();

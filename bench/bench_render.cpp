@@ -10,9 +10,9 @@
 #include <QImage>
 #include <QImageWriter>
 #include <QTemporaryDir>
-#include <cmath>
 #include <string>
 
+#include "bench/BenchCharts.h"
 #include "chart/control/model/ChartControl.h"
 #include "chart/control/render/ChartExport.h"
 #include "chart/control/render/PngWriter.h"
@@ -21,74 +21,11 @@ using namespace kg::control;
 
 namespace {
 
-void styleLikeTheChartObject(ChartControl& c)
-{
-    c.header = {"Qty of Bookings: Total = 12345", {10, true}};
-    c.footer.font = {10, true};
-    c.backgroundColor = 12763842;
-    c.border = {6, 7};
-    c.chartArea.backgroundColor = 11788021;
-    c.chartArea.plotArea = {13495295, true};
-    c.chartArea.border = {4, 2};
-    c.chartArea.x.title = "Month";
-    c.chartArea.y.title = "Quantity";
-    c.chartArea.y.presentationCode = 2;
-    c.chartArea.x.annotationMethod = 2;
-    c.chartArea.view3D = {10, 10, 10};  // the stored style's defaults
-    c.legend = {true, 17, 10, 10};
-}
-
-std::string numberText(double v)
-{
-    std::string s = std::to_string(std::lround(v));
-    return v >= 0 ? " " + s : s;
-}
-
-void addValueLabels(ChartControl& c)
-{
-    for (int32_t s = 1; s <= c.data().seriesCount(); ++s) {
-        for (int32_t p = 1; p <= c.data().pointCount(s); ++p) {
-            ChartLabel& l = c.addChartLabel();
-            l.text = numberText(c.data().y(s, p));
-            l.name = "LB " + l.text;
-            l.attachMethod = 2;
-            l.series = s;
-            l.point = p;
-            l.offset = 20;
-            l.isConnected = true;
-            l.border = 4;
-            l.borderWidth = 1;
-            l.backgroundColor = 65535;
-        }
-    }
-}
-
-void fill(ChartControl& c, int series, int points, int16_t type)
-{
-    static const char* months[] = {"January", "February", "March",     "April",   "May",      "June",
-                                   "July",    "August",   "September", "October", "November", "December"};
-    c.group1.chartType = type;
-    c.data().setBatched(true);
-    c.data().setSeriesCount(series);
-    for (int s = 1; s <= series; ++s) {
-        c.data().setPointCount(s, points);
-        c.group1.seriesLabels.push_back("Series " + std::to_string(s));
-        for (int p = 1; p <= points; ++p) {
-            c.data().setX(s, p, p);
-            c.data().setY(s, p, std::round(100 + s * 2 + 40 * std::sin(p * 0.05 + s * 0.7)));
-        }
-    }
-    for (int p = 1; p <= points; ++p) c.group1.pointLabels.push_back(points <= 12 ? months[p - 1] : std::to_string(p));
-    c.data().setBatched(false);
-}
-
 ChartControl& monthlyReport()
 {
     static ChartControl c;
     if (c.data().seriesCount() == 0) {
-        styleLikeTheChartObject(c);
-        fill(c, 10, 12, kBar);
-        addValueLabels(c);
+        bench::fillMonthlyReport(c);
     }
     return c;
 }
@@ -97,7 +34,7 @@ ChartControl& statusPie()
 {
     static ChartControl c;
     if (c.data().seriesCount() == 0) {
-        styleLikeTheChartObject(c);
+        bench::styleLikeTheChartObject(c);
         c.header.text = "Jobs by status";
         const double values[] = {12, 30, 5, 8, 22, 17, 3, 9, 14, 26, 7, 11, 4};
         c.group1.chartType = kPie;
@@ -116,9 +53,9 @@ ChartControl& hourlyPlot()
 {
     static ChartControl c;
     if (c.data().seriesCount() == 0) {
-        styleLikeTheChartObject(c);
+        bench::styleLikeTheChartObject(c);
         c.chartArea.x.annotationMethod = 0;
-        fill(c, 200, 1000, kPlot);
+        bench::fill(c, 200, 1000, kPlot);
     }
     return c;
 }
