@@ -70,6 +70,18 @@ bool ComponentLibrary::resolve(void* handle, std::string& why)
     return all;
 }
 
+bool ComponentLibrary::adopt(void* handle, const std::string& path, std::string& why)
+{
+    if (!resolve(handle, why)) {
+        why = path + ": " + why;
+        dlclose(handle);  // not ours: let the loader drop it
+        return false;
+    }
+    handle_ = handle;
+    path_ = path;
+    return true;
+}
+
 bool ComponentLibrary::open(const std::string& path, std::string& why)
 {
     // Local symbols: the component's insides must not meet the demo's own copy of the sample writer.
@@ -78,13 +90,7 @@ bool ComponentLibrary::open(const std::string& path, std::string& why)
         why = "cannot load " + path + ": " + loaderError();
         return false;
     }
-    if (!resolve(handle, why)) {
-        why = path + ": " + why;
-        return false;
-    }
-    handle_ = handle;
-    path_ = path;
-    return true;
+    return adopt(handle, path, why);
 }
 
 bool ComponentLibrary::openServing(const KGObject* object, std::string& why)
@@ -102,13 +108,7 @@ bool ComponentLibrary::openServing(const KGObject* object, std::string& why)
         why = path + " is not a loaded library: " + loaderError();
         return false;
     }
-    if (!resolve(handle, why)) {
-        why = path + ": " + why;
-        return false;
-    }
-    handle_ = handle;
-    path_ = path;
-    return true;
+    return adopt(handle, path, why);
 }
 
 }  // namespace kg::demo

@@ -46,6 +46,8 @@ public:
 
 private:
     bool resolve(void* handle, std::string& why);
+    // Takes `handle` as the library when it has every entry point, else closes it again.
+    bool adopt(void* handle, const std::string& path, std::string& why);
 
     void* handle_ = nullptr;
     std::string path_;
