@@ -143,7 +143,7 @@ TEST_P(FaultWalk, EveryFailurePointFailsTheRequestCleanly)
         const std::string again = charted();
         if (!again.empty()) report.add(p, "the next request fails: " + again);
     }
-    std::printf("[   walk   ] %s: %zu failure points walked\n", GetParam().name, report.points);
+    std::printf("[   walk   ] %s: %zu failure point%s walked\n", GetParam().name, report.points, report.points == 1 ? "" : "s");
     EXPECT_TRUE(report.problems.empty()) << report.summary();
 }
 

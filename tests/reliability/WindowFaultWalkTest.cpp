@@ -282,7 +282,7 @@ TEST_P(WindowWalk, EveryFailurePointIsReportedAndLeavesAWorkingComponent)
         if (!next.empty()) report.add(p, "the next request fails: " + next);
         if (qt_->mousePointer() != kPointerDefault) report.add(p, "the next request leaves the hourglass");
     }
-    std::printf("[   walk   ] %s: %zu failure points walked\n", command.name, report.points);
+    std::printf("[   walk   ] %s: %zu failure point%s walked\n", command.name, report.points, report.points == 1 ? "" : "s");
     EXPECT_TRUE(report.problems.empty()) << report.summary();
 }
 
