@@ -9,11 +9,9 @@
 namespace kg {
 namespace {
 
-struct NumberTextRow {
-    const char* name;
+struct NumberTextRow : test::Named {
     double value;
     const char* expected;
-    friend void PrintTo(const NumberTextRow& r, std::ostream* os) { *os << r.name; }
 };
 
 constexpr double kInf = std::numeric_limits<double>::infinity();
@@ -24,48 +22,33 @@ const NumberTextRow kNumberTexts[] = {
     {"NegativeZero", -0.0, " 0"},
     {"One", 1.0, " 1"},
     {"MinusOne", -1.0, "-1"},
-    {"MinusThree", -3.0, "-3"},
-    {"Five", 5.0, " 5"},
     // decimals as the value needs, a 0 before the point
     {"TwelvePointFive", 12.5, " 12.5"},
-    {"MinusTwelvePointFive", -12.5, "-12.5"},
     {"Half", 0.5, " 0.5"},
     {"MinusHalf", -0.5, "-0.5"},
-    {"PointSeven", 0.7, " 0.7"},
     {"NinetyNinePointNineNine", 99.99, " 99.99"},
     {"Hundred", 100.0, " 100"},
     // 15 significant digits, trailing zeros dropped
     {"PointOnePlusPointTwo", 0.1 + 0.2, " 0.3"},
-    {"ThreeTimesPointOne", 0.1 * 3, " 0.3"},
     {"OneThird", 1.0 / 3.0, " 0.333333333333333"},
     {"TwoThirds", 2.0 / 3.0, " 0.666666666666667"},
-    {"MinusTwoThirds", -2.0 / 3.0, "-0.666666666666667"},
     {"NineDigitsAndFraction", 123456789.123456789, " 123456789.123457"},
     {"FifteenDigitFraction", 0.123456789012345, " 0.123456789012345"},
-    // 16- and 32-bit limits
-    {"IntegerMax", 32767.0, " 32767"},
-    {"IntegerMin", -32768.0, "-32768"},
+    // 32-bit limits
     {"LongMax", 2147483647.0, " 2147483647"},
     {"LongMin", -2147483648.0, "-2147483648"},
-    {"LongMaxAndHalf", 2147483647.5, " 2147483647.5"},
     // plain as long as 15 integer digits suffice
-    {"OneE14", 1e14, " 100000000000000"},
-    {"FifteenDigitInteger", 123456789012345.0, " 123456789012345"},
     {"FifteenNines", 999999999999999.0, " 999999999999999"},
     {"OneE15NeedsSixteenDigits", 1e15, " 1E+15"},
     {"RoundsUpToOneE15", 999999999999999.9, " 1E+15"},
     {"SixteenDigitInteger", 1234567890123456.0, " 1.23456789012346E+15"},
-    {"OneE16", 1e16, " 1E+16"},
     {"OnePointFiveE20", 1.5e20, " 1.5E+20"},
-    {"MinusOnePointFiveE20", -1.5e20, "-1.5E+20"},
     {"ThreeDigitExponent", 1e100, " 1E+100"},
     {"LargestDouble", std::numeric_limits<double>::max(), " 1.79769313486232E+308"},
     // plain as long as 15 digits after the point suffice
-    {"OneE_5", 0.00001, " 0.00001"},
     {"OnePointFiveE_5", 1.5e-5, " 0.000015"},
     {"OneE_15", 1e-15, " 0.000000000000001"},
     {"OneE_16", 1e-16, " 1E-16"},
-    {"MinusOneE_16", -1e-16, "-1E-16"},
     {"SixteenPlacesNeeded", 0.0123456789012345, " 1.23456789012345E-02"},
     {"SmallWithTwelveDigits", 1.23456789012e-5, " 1.23456789012E-05"},
     {"SmallestDenormal", std::numeric_limits<double>::denorm_min(), " 4.94065645841247E-324"},
@@ -82,7 +65,7 @@ TEST_P(NumberText, WritesTheValueWithItsSignPosition)
     EXPECT_EQ(numberText(GetParam().value), GetParam().expected);
 }
 
-INSTANTIATE_TEST_SUITE_P(Core, NumberText, testing::ValuesIn(kNumberTexts), test::rowName<NumberTextRow>);
+INSTANTIATE_TEST_SUITE_P(Core, NumberText, testing::ValuesIn(kNumberTexts), test::RowName{});
 
 }  // namespace
 }  // namespace kg

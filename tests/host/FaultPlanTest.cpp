@@ -4,10 +4,8 @@
 
 #include <functional>
 
-#include <QDir>
 #include <QTemporaryDir>
 
-#include "core/Date.h"
 #include "core/Error.h"
 #include "host/TestStand.h"
 #include "HostTestSupport.h"
@@ -19,12 +17,16 @@ namespace {
 
 const std::string kSample = std::string(KG_TEST_DATA) + "/host/form_sample.json";
 
-struct FaultCase {
-    const char* name;
+Variant sampleForm() { return Variant(loadFormFile(kSample)); }
+Variant sampleMember(const char* member, Args args = {}) { return call(sampleForm(), member, args); }
+Variant hostObject(host::HostClass cls) { return Variant(makeFactory()->create(cls)); }
+
+struct FaultCase : test::Named {
     std::string operation;
     int nth;
-    // One call of the operation (the objects are made once per case).
-    std::function<std::function<void()>(const QTemporaryDir&)> prepare;
+    std::function<Variant()> target;  // made once per case; with no member, making it is the call
+    const char* member;
+    Args args;
 };
 
 class FaultPlanCase : public testing::TestWithParam<FaultCase> {
@@ -38,84 +40,48 @@ protected:
 
 TEST_P(FaultPlanCase, FailsExactlyTheNthCall)
 {
+    const FaultCase& c = GetParam();
     QTemporaryDir dir(test::tempTemplate("fault"));
     ASSERT_TRUE(dir.isValid());
     config().settingsFile = dir.filePath("settings.ini").toStdString();
-    const std::function<void()> once = GetParam().prepare(dir);
-    FaultPlan::failOn(GetParam().operation, GetParam().nth);
-    for (int n = 1; n <= GetParam().nth + 2; ++n) {
-        if (n != GetParam().nth) {
-            EXPECT_NO_THROW(once()) << "call " << n;
+    const Variant target = c.member ? c.target() : Variant();
+    const auto once = [&] {
+        Args args = c.args;
+        c.member ? call(target, c.member, args) : c.target();
+    };
+    FaultPlan::failOn(c.operation, c.nth);
+    for (int n = 1; n <= c.nth + 2; ++n) {
+        const test::Raised raised = test::raisedBy(once);
+        if (n != c.nth) {
+            EXPECT_EQ(raised.number, 0) << "call " << n << ": " << raised.description;
             continue;
         }
-        try {
-            once();
-            ADD_FAILURE() << "call " << n << " passed";
-        } catch (const Error& e) {
-            EXPECT_EQ(e.number(), errc::HostBase + hosterr::Injected);
-            EXPECT_EQ(e.description(),
-                      "Injected failure of " + GetParam().operation + " (call " + std::to_string(n) + ")");
-        }
+        EXPECT_EQ(raised.number, errc::HostBase + hosterr::Injected) << "call " << n;
+        EXPECT_EQ(raised.description, "Injected failure of " + c.operation + " (call " + std::to_string(n) + ")");
     }
-    EXPECT_EQ(FaultPlan::callsOf(GetParam().operation), GetParam().nth + 2);
+    EXPECT_EQ(FaultPlan::callsOf(c.operation), c.nth + 2);
 }
-
-Variant sampleForm() { return Variant(loadFormFile(kSample)); }
-Variant hostObject(host::HostClass cls) { return Variant(makeFactory()->create(cls)); }
 
 INSTANTIATE_TEST_SUITE_P(
     Operations, FaultPlanCase,
     testing::Values(
-        FaultCase{"textmatrix", "Grid.textmatrix", 3,
-                  [](const QTemporaryDir&) {
-                      const Variant grid = call(sampleForm(), "grid1");
-                      return std::function<void()>([grid] { call(grid, "TEXTMATRIX", {1, 1}); });
-                  }},
-        FaultCase{"formGrid", "Form.grid1", 1,
-                  [](const QTemporaryDir&) {
-                      const Variant form = sampleForm();
-                      return std::function<void()>([form] { call(form, "Grid1"); });
-                  }},
-        FaultCase{"pickerValue", "Picker.Value", 2,
-                  [](const QTemporaryDir&) {
-                      const Variant picker = call(sampleForm(), "dtpFromDate");
-                      return std::function<void()>([picker] { call(picker, "Value"); });
-                  }},
-        FaultCase{"listEntry", "List.List", 2,
-                  [](const QTemporaryDir&) {
-                      const Variant list = call(sampleForm(), "cboFields", {1});
-                      return std::function<void()>([list] { call(list, "List", {0}); });
-                  }},
-        FaultCase{"writeSetting", "Settings.WriteSetting", 2,
-                  [](const QTemporaryDir&) {
-                      const Variant s = hostObject(host::HostClass::Settings);
-                      return std::function<void()>([s] {
-                          Args args{"2dCharts", "Style", "Bar", "Tavix", Variant()};
-                          call(s, "WriteSetting", args);
-                      });
-                  }},
+        FaultCase{"textmatrix", "Grid.textmatrix", 3, [] { return sampleMember("grid1"); }, "TEXTMATRIX", {1, 1}},
+        FaultCase{"formGrid", "Form.grid1", 1, sampleForm, "Grid1", {}},
+        FaultCase{"pickerValue", "Picker.Value", 2, [] { return sampleMember("dtpFromDate"); }, "Value", {}},
+        FaultCase{"listEntry", "List.List", 2, [] { return sampleMember("cboFields", {1}); }, "List", {0}},
+        FaultCase{"writeSetting", "Settings.WriteSetting", 2, [] { return hostObject(host::HostClass::Settings); },
+                  "WriteSetting", {"2dCharts", "Style", "Bar", "Tavix", Variant()}},
         FaultCase{"appFolder", "AppServices.GetAppFolder", 1,
-                  [](const QTemporaryDir&) {
-                      const Variant app = hostObject(host::HostClass::AppServices);
-                      return std::function<void()>([app] {
-                          Args args{Variant()};
-                          call(app, "GetAppFolder", args);
-                      });
-                  }},
-        FaultCase{"setToDate", "JobData.SetToDate", 4,
-                  [](const QTemporaryDir&) {
-                      const Variant jobs = hostObject(host::HostClass::JobData);
-                      return std::function<void()>([jobs] { call(jobs, "SetToDate", {Variant::date(46000)}); });
-                  }},
-        FaultCase{"createSettings", "Factory.Settings", 2,
-                  [](const QTemporaryDir&) {
-                      return std::function<void()>([] { makeFactory()->create(host::HostClass::Settings); });
-                  }}),
-    [](const auto& info) { return std::string(info.param.name); });
+                  [] { return hostObject(host::HostClass::AppServices); }, "GetAppFolder", {Variant()}},
+        FaultCase{"setToDate", "JobData.SetToDate", 4, [] { return hostObject(host::HostClass::JobData); },
+                  "SetToDate", {Variant::date(46000)}},
+        FaultCase{"createSettings", "Factory.Settings", 2, [] { return hostObject(host::HostClass::Settings); },
+                  nullptr, {}}),
+    test::RowName{});
 
 TEST(FaultPlan, OtherOperationsAndClearedPlansPass)
 {
-    const Variant grid = call(sampleForm(), "grid1");
+    const Variant grid = sampleMember("grid1");
     FaultPlan::failOn("Grid.GetValueFromCell", 1);
     EXPECT_NO_THROW(call(grid, "textmatrix", {0, 0}));
     EXPECT_EQ(FaultPlan::callsOf("Grid.textmatrix"), 0);
@@ -126,7 +92,7 @@ TEST(FaultPlan, OtherOperationsAndClearedPlansPass)
 
 TEST(FaultPlan, NewPlanStartsCountingAgain)
 {
-    const Variant grid = call(sampleForm(), "grid1");
+    const Variant grid = sampleMember("grid1");
     FaultPlan::failOn("Grid.Rows", 2);
     call(grid, "Rows");
     FaultPlan::failOn("Grid.Rows", 2);

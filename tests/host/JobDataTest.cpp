@@ -2,10 +2,8 @@
 // 65 fields, dates bound as parameters, and a database that cannot be used named in the error.
 #include <gtest/gtest.h>
 
-#include <functional>
+#include <array>
 
-#include <QDir>
-#include <QFile>
 #include <QTemporaryDir>
 #include <sqlite3.h>
 
@@ -44,7 +42,9 @@ const char* kJobs =
     " ('2026-01-31', 'last', 0, 1, 1, 1, 1, 1),"
     " ('2026-02-01', 'after', NULL, NULL, NULL, NULL, NULL, NULL);";
 
-Variant isoDate(const char* text) { return Variant::date(*parseIsoDate(text)); }
+constexpr int32_t kJobDataError = errc::HostBase + hosterr::JobData;
+
+Variant day(const char* iso, double time = 0) { return Variant::date(*parseIsoDate(iso) + time); }
 
 class JobData : public testing::Test {
 protected:
@@ -84,6 +84,15 @@ protected:
         return args[1];
     }
 
+    // The error of a fetch between the dates, when given, with `sql` (else the component's query).
+    Error fetchError(const char* from, const char* to, const char* sql = nullptr)
+    {
+        if (from) call(jobs_, "SetFromDate", {day(from)});
+        if (to) call(jobs_, "SetToDate", {day(to)});
+        Args args{sql ? Variant(sql) : Variant(query()), Variant(), int32_t{0}, "", int32_t{0}};
+        return test::errorOf([&] { call(jobs_, "FetchJobRows", args); });
+    }
+
     // The status texts (field 26) of the rows, in order.
     std::vector<std::string> statuses(const Variant& from, const Variant& to)
     {
@@ -106,10 +115,8 @@ protected:
     Variant jobs_;
 };
 
-struct RangeCase {
-    const char* name;
-    const char* from;
-    const char* to;
+struct RangeCase : test::Named {
+    Variant from, to;
     std::vector<std::string> expected;
 };
 
@@ -117,36 +124,33 @@ class JobDateRange : public JobData, public testing::WithParamInterface<RangeCas
 
 TEST_P(JobDateRange, HoldsTheJobsOfBothEnds)
 {
-    EXPECT_EQ(statuses(isoDate(GetParam().from), isoDate(GetParam().to)), GetParam().expected);
+    EXPECT_EQ(statuses(GetParam().from, GetParam().to), GetParam().expected);
 }
 
 INSTANTIATE_TEST_SUITE_P(
     Ranges, JobDateRange,
-    testing::Values(RangeCase{"month", "2026-01-01", "2026-01-31", {"first", "middle", "last"}},
-                    RangeCase{"oneDay", "2026-01-15", "2026-01-15", {"middle"}},
-                    RangeCase{"firstDayOnly", "2026-01-01", "2026-01-01", {"first"}},
-                    RangeCase{"wide", "2025-01-01", "2026-12-31", {"before", "first", "middle", "last", "after"}},
-                    RangeCase{"noJobs", "2027-01-01", "2027-12-31", {}},
-                    RangeCase{"reversed", "2026-01-31", "2026-01-01", {}}),
-    [](const auto& info) { return std::string(info.param.name); });
-
-TEST_F(JobData, DateWithATimeOfDayCountsTheWholeDay)
-{
-    const double day = *parseIsoDate("2026-01-31");
-    EXPECT_EQ(statuses(Variant::date(day + 0.75), Variant::date(day + 0.75)), std::vector<std::string>{"last"});
-}
+    testing::Values(
+        RangeCase{"month", day("2026-01-01"), day("2026-01-31"), {"first", "middle", "last"}},
+        RangeCase{"oneDay", day("2026-01-15"), day("2026-01-15"), {"middle"}},
+        RangeCase{"wide", day("2025-01-01"), day("2026-12-31"), {"before", "first", "middle", "last", "after"}},
+        RangeCase{"noJobs", day("2027-01-01"), day("2027-12-31"), {}},
+        RangeCase{"reversed", day("2026-01-31"), day("2026-01-01"), {}},
+        RangeCase{"timeOfDayCountsTheWholeDay", day("2026-01-31", 0.75), day("2026-01-31", 0.75), {"last"}},
+        RangeCase{"datesAsText", Variant("2026-01-15"), Variant("2026-01-15"), {"middle"}},
+        // Spliced into the query rather than bound, these texts would select every job.
+        RangeCase{"fromTextIsBound", Variant("9999-01-01' OR '1'='1"), day("2026-12-31"), {}},
+        RangeCase{"toTextIsBound", day("2026-01-31"), Variant("2026-01-31'; DROP TABLE jobs; --"), {"last"}}),
+    test::RowName{});
 
 TEST_F(JobData, RowsHaveSixtyFiveFieldsWithNullWhereNoColumn)
 {
     int32_t count = 0;
-    const Variant rows = fetch(isoDate("2026-01-01"), isoDate("2026-01-01"), count);
+    const Variant rows = fetch(day("2026-01-01"), day("2026-01-01"), count);
     ASSERT_EQ(count, 1);
     ASSERT_TRUE(rows.isArray());
     const VariantArray& a = rows.array();
-    EXPECT_EQ(a.lower(0), 0);
-    EXPECT_EQ(a.upper(0), 64);
-    EXPECT_EQ(a.lower(1), 0);
-    EXPECT_EQ(a.upper(1), 0);
+    EXPECT_EQ((std::array<int32_t, 4>{a.lower(0), a.upper(0), a.lower(1), a.upper(1)}),
+              (std::array<int32_t, 4>{0, 64, 0, 0}));
     for (int32_t f : {0, 1, 2, 25, 27, 43, 47, 51, 53, 58, 60, 63})
         EXPECT_TRUE(a.at(f, 0).isNull()) << "field " << f;
     EXPECT_EQ(a.at(26, 0).str(), "first");
@@ -166,55 +170,36 @@ TEST_F(JobData, TableWithoutSomeColumnsGivesNullForThem)
                "INSERT INTO jobs(job_date, f26, notes) VALUES ('2026-01-05', 'Confirmed', 'x');");
     useDatabase(path);
     int32_t count = 0;
-    const Variant rows = fetch(isoDate("2026-01-01"), isoDate("2026-01-31"), count);
+    const Variant rows = fetch(day("2026-01-01"), day("2026-01-31"), count);
     ASSERT_EQ(count, 1);
     EXPECT_EQ(rows.array().at(26, 0).str(), "Confirmed");
     for (int32_t f : {44, 45, 46, 52, 59, 64}) EXPECT_TRUE(rows.array().at(f, 0).isNull()) << "field " << f;
 }
 
-TEST_F(JobData, DateTextsAreBoundNotSpliced)
-{
-    // Spliced into the query, this "from" date would select every job.
-    EXPECT_EQ(statuses(Variant("9999-01-01' OR '1'='1"), isoDate("2026-12-31")), std::vector<std::string>{});
-    EXPECT_EQ(statuses(isoDate("2026-01-31"), Variant("2026-01-31'; DROP TABLE jobs; --")),
-              std::vector<std::string>{"last"});
-    EXPECT_EQ(statuses(Variant("2026-01-15"), Variant("2026-01-15")), std::vector<std::string>{"middle"});
-}
-
 TEST_F(JobData, QueryThatWritesIsRefused)
 {
-    call(jobs_, "SetFromDate", {isoDate("2025-01-01")});
-    call(jobs_, "SetToDate", {isoDate("2027-01-01")});
-    Args args{"DELETE FROM jobs", Variant(), int32_t{0}, "", int32_t{0}};
-    const Error e = test::errorOf([&] { call(jobs_, "FetchJobRows", args); });
-    EXPECT_EQ(e.number(), errc::HostBase + hosterr::JobData);
-    EXPECT_EQ(statuses(isoDate("2025-01-01"), isoDate("2027-01-01")).size(), 5u);
-}
-
-TEST_F(JobData, OtherQueryOptionIsRefused)
-{
-    Args args{int32_t{1}, ""};
-    EXPECT_EQ(test::errorOf([&] { call(jobs_, "GetJobQuery", args); }).number(), errc::InvalidProcedureCall);
+    EXPECT_EQ(fetchError("2025-01-01", "2027-01-01", "DELETE FROM jobs").number(), kJobDataError);
+    EXPECT_EQ(statuses(day("2025-01-01"), day("2027-01-01")).size(), 5u);
 }
 
 TEST_F(JobData, FetchWithoutDatesIsAnError)
 {
-    Args args{query(), Variant(), int32_t{0}, "", int32_t{0}};
-    const Error e = test::errorOf([&] { call(jobs_, "FetchJobRows", args); });
-    EXPECT_EQ(e.number(), errc::HostBase + hosterr::JobData);
+    const Error e = fetchError(nullptr, nullptr);
+    EXPECT_EQ(e.number(), kJobDataError);
     EXPECT_NE(e.description().find("SetFromDate"), std::string::npos) << e.description();
 }
 
-TEST_F(JobData, DateOfAnotherKindIsATypeMismatch)
+TEST_F(JobData, OtherQueryOptionOrDateOfAnotherKindIsRefused)
 {
-    for (const Variant& v : {Variant::null(), Variant(), Variant(VariantArray(0, 0, 0, 0))})
+    EXPECT_EQ(test::errorOf([&] { call(jobs_, "GetJobQuery", {1, ""}); }).number(), errc::InvalidProcedureCall);
+    for (const Variant& v : {Variant::null(), Variant(), test::anArray()})
         EXPECT_EQ(test::errorOf([&] { call(jobs_, "SetFromDate", {v}); }).number(), errc::TypeMismatch);
 }
 
-struct BadDatabaseCase {
-    const char* name;
-    std::function<std::string(const QTemporaryDir&)> make;  // gives the database path
+struct BadDatabaseCase : test::Named {
+    std::string (*make)(const QTemporaryDir&);  // gives the database path
     int32_t number;
+    const char* naming = nullptr;  // what the error names; the path when nullptr
 };
 
 class UnusableDatabase : public JobData, public testing::WithParamInterface<BadDatabaseCase> {};
@@ -223,12 +208,10 @@ TEST_P(UnusableDatabase, FailsTheFetchNamingTheFile)
 {
     const std::string path = GetParam().make(dir_);
     useDatabase(path);  // creating the object does not touch the file
-    call(jobs_, "SetFromDate", {isoDate("2026-01-01")});
-    call(jobs_, "SetToDate", {isoDate("2026-01-31")});
-    Args args{query(), Variant(), int32_t{0}, "", int32_t{0}};
-    const Error e = test::errorOf([&] { call(jobs_, "FetchJobRows", args); });
+    const Error e = fetchError("2026-01-01", "2026-01-31");
     EXPECT_EQ(e.number(), GetParam().number);
-    EXPECT_NE(e.description().find(path), std::string::npos) << e.description();
+    EXPECT_NE(e.description().find(GetParam().naming ? GetParam().naming : path), std::string::npos)
+        << e.description();
 }
 
 INSTANTIATE_TEST_SUITE_P(
@@ -238,34 +221,20 @@ INSTANTIATE_TEST_SUITE_P(
                         errc::FileNotFound},
         BadDatabaseCase{"notADatabase",
                         [](const QTemporaryDir& d) {
-                            const QString p = d.filePath("text.db");
-                            QFile f(p);
-                            f.open(QIODevice::WriteOnly);
-                            f.write(QByteArray(4096, 'k'));
-                            return p.toStdString();
+                            test::writeBytes(d.filePath("text.db").toStdString(), QByteArray(4096, 'k'));
+                            return d.filePath("text.db").toStdString();
                         },
-                        errc::HostBase + hosterr::JobData},
+                        kJobDataError},
         BadDatabaseCase{"noJobsTable",
                         [](const QTemporaryDir& d) {
-                            const std::string p = d.filePath("other.db").toStdString();
-                            exec(p, "CREATE TABLE other(x);");
-                            return p;
+                            exec(d.filePath("other.db").toStdString(), "CREATE TABLE other(x);");
+                            return d.filePath("other.db").toStdString();
                         },
-                        errc::HostBase + hosterr::JobData},
-        BadDatabaseCase{"folder", [](const QTemporaryDir& d) { return d.path().toStdString(); },
-                        errc::HostBase + hosterr::JobData}),
-    [](const auto& info) { return std::string(info.param.name); });
-
-TEST_F(JobData, NoDatabaseConfiguredIsAnError)
-{
-    useDatabase("");
-    call(jobs_, "SetFromDate", {isoDate("2026-01-01")});
-    call(jobs_, "SetToDate", {isoDate("2026-01-31")});
-    Args args{query(), Variant(), int32_t{0}, "", int32_t{0}};
-    const Error e = test::errorOf([&] { call(jobs_, "FetchJobRows", args); });
-    EXPECT_EQ(e.number(), errc::HostBase + hosterr::JobData);
-    EXPECT_NE(e.description().find("No jobs database"), std::string::npos) << e.description();
-}
+                        kJobDataError},
+        BadDatabaseCase{"folder", [](const QTemporaryDir& d) { return d.path().toStdString(); }, kJobDataError},
+        BadDatabaseCase{"notConfigured", [](const QTemporaryDir&) { return std::string(); }, kJobDataError,
+                        "No jobs database"}),
+    test::RowName{});
 
 TEST_F(JobData, WrongArgumentCountsAreRefused)
 {
