@@ -1,10 +1,11 @@
 #pragma once
 // What the C surface tests share: a scratch folder with the test stand pointed at it, a private
-// registration file, and small owners for objects and variants. Only the public C header is used
-// to reach the component, as a host would.
+// registration file, a graph made through the class object, and small owners for objects and
+// variants. Only the public C header is used to reach the component, as a host would.
 #include <gtest/gtest.h>
 
 #include <cstdint>
+#include <cstdio>
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
@@ -17,6 +18,9 @@
 namespace capi_test {
 
 namespace fs = std::filesystem;
+
+// Names each generated case after its table row.
+inline constexpr auto byName = [](const auto& info) { return std::string(info.param.name); };
 
 inline std::string dataFile(const std::string& name) { return std::string(KG_TEST_DATA) + "/capi/" + name; }
 
@@ -51,6 +55,17 @@ inline std::string guidText(const KGGuid& g)
                   unsigned(g.Data2), unsigned(g.Data3), g.Data4[0], g.Data4[1], g.Data4[2], g.Data4[3], g.Data4[4],
                   g.Data4[5], g.Data4[6], g.Data4[7]);
     return buf;
+}
+
+inline std::string describe(const KGErrorInfo& err)
+{
+    return "error " + std::to_string(err.number) + ": " + err.description;
+}
+
+inline std::string lastErrorDescription()
+{
+    KGErrorInfo info;
+    return KGGetLastError(&info) == KG_S_OK ? std::string(info.description) : std::string("(no error kept)");
 }
 
 // One reference to an object, released at the end of the scope.
@@ -100,6 +115,14 @@ inline void setDouble(KGVariant& v, double d)
     v.dblVal = d;
 }
 
+// SourceForm := form (Nothing when form is null).
+inline int32_t putSourceForm(KGObject* graph, KGObject* form, KGErrorInfo* err)
+{
+    Var arg;
+    KGVariantSetObject(&arg.v, form);
+    return KGInvoke(graph, KG_DISPID_SOURCEFORM, KG_DISPATCH_PROPERTYPUT, &arg.v, 1, nullptr, err);
+}
+
 // A scratch folder per test, the test stand's settings and application folder inside it, and a
 // registration file of its own through $KARSTGRAPH_REGISTRY.
 class CapiTest : public ::testing::Test {
@@ -136,16 +159,41 @@ protected:
         ASSERT_NE(graph.get(), nullptr);
     }
 
-    // SourceForm := form (Nothing when form is null).
-    static int32_t putSourceForm(KGObject* graph, KGObject* form, KGErrorInfo* err)
+    // The registration file as a host's other classes left it.
+    void writeRegistry(const std::string& text) const
     {
-        Var arg;
-        KGVariantSetObject(&arg.v, form);
-        return KGInvoke(graph, KG_DISPID_SOURCEFORM, KG_DISPATCH_PROPERTYPUT, &arg.v, 1, nullptr, err);
+        fs::create_directories(registry.parent_path());
+        writeText(registry, text);
     }
 
     fs::path dir;
     fs::path registry;
+};
+
+// A graph of its own per test; the form it was given is let go of at the end, since the state
+// behind SourceForm outlives the object and no test may see another's.
+class GraphTest : public CapiTest {
+protected:
+    void SetUp() override
+    {
+        CapiTest::SetUp();
+        createGraph(graph);
+    }
+    void TearDown() override
+    {
+        KGErrorInfo err;
+        if (graph.get()) {
+            EXPECT_EQ(putSourceForm(graph.get(), nullptr, &err), KG_S_OK) << describe(err);
+        }
+        graph.reset();
+        CapiTest::TearDown();
+    }
+    int32_t request(int32_t id, KGVariant* args, uint32_t argc, KGErrorInfo* err)
+    {
+        return KGInvoke(graph.get(), id, KG_DISPATCH_METHOD, args, argc, nullptr, err);
+    }
+
+    ObjectRef graph;
 };
 
 }  // namespace capi_test

@@ -40,15 +40,6 @@ protected:
     fs::path tool;
 };
 
-char hexDigit(unsigned v) { return "0123456789ABCDEF"[v & 0xF]; }
-
-std::string hexId(int32_t id)
-{
-    std::string s = "0x";
-    for (int shift = 28; shift >= 0; shift -= 4) s += hexDigit(static_cast<unsigned>(id) >> shift);
-    return s;
-}
-
 TEST_F(CliTest, DescribeShowsTheIdsAndEveryOperationWithItsSlotAndDispatchId)
 {
     const ToolRun r = run("describe");
@@ -65,12 +56,14 @@ TEST_F(CliTest, DescribeShowsTheIdsAndEveryOperationWithItsSlotAndDispatchId)
                {9, "GenerateChart_ServCatSumm", KG_DISPID_GENERATECHART_SERVCATSUMM},
                {15, "GenerateChart_HourlyGraph3", KG_DISPID_GENERATECHART_HOURLYGRAPH3}};
     for (const auto& op : ops) {
-        const size_t line = r.output.find(" " + std::string(op.name) + " ");
-        ASSERT_NE(line, std::string::npos) << op.name;
-        const std::string text = r.output.substr(r.output.rfind('\n', line) + 1,
-                                                 r.output.find('\n', line) - r.output.rfind('\n', line) - 1);
-        EXPECT_EQ(std::stoi(text), op.slot) << text;
-        EXPECT_NE(text.find(hexId(op.id)), std::string::npos) << text;
+        const size_t at = r.output.find(" " + std::string(op.name) + " ");
+        ASSERT_NE(at, std::string::npos) << op.name;
+        const size_t from = r.output.rfind('\n', at) + 1;
+        const std::string line = r.output.substr(from, r.output.find('\n', at) - from);
+        char hexId[16];
+        std::snprintf(hexId, sizeof hexId, "0x%08X", static_cast<unsigned>(op.id));
+        EXPECT_EQ(std::stoi(line), op.slot) << line;
+        EXPECT_NE(line.find(hexId), std::string::npos) << line;
     }
 }
 
@@ -112,6 +105,6 @@ INSTANTIATE_TEST_SUITE_P(
                                 "/nonexistent/libkarstgraph.so"},
                       UsageCase{"RegisterWithAStrayArgument", "register now", 2, "unexpected argument"},
                       UsageCase{"DescribeWithAnArgument", "describe all", 2, "usage: karstgraph describe"}),
-    [](const auto& info) { return std::string(info.param.name); });
+    byName);
 
 }  // namespace

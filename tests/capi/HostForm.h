@@ -5,7 +5,6 @@
 #include <strings.h>
 
 #include <cstdio>
-#include <cstring>
 #include <string>
 #include <vector>
 
@@ -26,38 +25,19 @@ struct HostLog {
     int alive = 0;                   // host objects not yet freed
 };
 
-struct HostGrid {
-    KGObject base;  // first, so a HostGrid* is a KGObject*
+// The form (members: grid1) or its grid (members: Rows, FixedRows, cols, textmatrix).
+struct HostObject {
+    KGObject base;  // first, so a HostObject* is a KGObject*
     uint32_t refs;
+    const char* members[4];  // a member's dispatch id is its place plus one
+    HostFailure failure;
+    HostLog* log;
+    HostObject* grid1;  // the form's reference; null on the grid
     int32_t rows, fixedRows, cols;
     const char* const* cells;  // rows * cols texts
-    HostFailure failure;
-    HostLog* log;
-};
-
-struct HostForm {
-    KGObject base;
-    uint32_t refs;
-    HostGrid* grid1;  // the form's reference
-    HostFailure failure;
-    HostLog* log;
 };
 
 namespace hostform {
-
-enum { kGrid1 = 1, kRows = 1, kFixedRows, kCols, kTextMatrix };
-
-inline int32_t fail(const HostFailure& f, KGErrorInfo* error)
-{
-    if (error) {
-        error->number = f.number;
-        std::snprintf(error->description, sizeof error->description, "%s", f.description);
-        std::snprintf(error->source, sizeof error->source, "%s", "TavixHost");
-    }
-    return f.status;
-}
-
-inline bool fails(const HostFailure& f, const char* member) { return f.member && strcasecmp(f.member, member) == 0; }
 
 inline int32_t wholeArg(const KGVariant& v)
 {
@@ -69,23 +49,25 @@ inline int32_t wholeArg(const KGVariant& v)
     }
 }
 
-inline uint32_t gridAddRef(KGObject* self) { return ++reinterpret_cast<HostGrid*>(self)->refs; }
-inline uint32_t gridRelease(KGObject* self)
+inline uint32_t addRef(KGObject* self) { return ++reinterpret_cast<HostObject*>(self)->refs; }
+
+inline uint32_t release(KGObject* self)
 {
-    HostGrid* g = reinterpret_cast<HostGrid*>(self);
-    const uint32_t left = --g->refs;
+    auto* o = reinterpret_cast<HostObject*>(self);
+    const uint32_t left = --o->refs;
     if (left == 0) {
-        --g->log->alive;
-        delete g;
+        if (o->grid1) KGRelease(&o->grid1->base);
+        --o->log->alive;
+        delete o;
     }
     return left;
 }
 
-inline int32_t gridGetIDOfName(KGObject*, const char* name, int32_t* id)
+inline int32_t getIDOfName(KGObject* self, const char* name, int32_t* id)
 {
-    static const char* const names[] = {"Rows", "FixedRows", "cols", "textmatrix"};
-    for (int i = 0; i < 4; ++i) {
-        if (strcasecmp(name, names[i]) == 0) {
+    const auto* o = reinterpret_cast<HostObject*>(self);
+    for (int i = 0; i < 4 && o->members[i]; ++i) {
+        if (strcasecmp(name, o->members[i]) == 0) {
             *id = i + 1;
             return KG_S_OK;
         }
@@ -93,72 +75,52 @@ inline int32_t gridGetIDOfName(KGObject*, const char* name, int32_t* id)
     return KG_E_UNKNOWNNAME;
 }
 
-inline int32_t gridInvoke(KGObject* self, int32_t id, uint16_t, KGVariant* args, uint32_t argc, KGVariant* result,
-                          KGErrorInfo* error)
+inline int32_t invoke(KGObject* self, int32_t id, uint16_t, KGVariant* args, uint32_t argc, KGVariant* result,
+                      KGErrorInfo* error)
 {
-    HostGrid* g = reinterpret_cast<HostGrid*>(self);
-    static const char* const names[] = {"", "Rows", "FixedRows", "cols", "textmatrix"};
-    if (id < kRows || id > kTextMatrix) return KG_E_MEMBERNOTFOUND;
-    std::string call = names[id];
-    if (id == kTextMatrix && argc == 2)
+    auto* o = reinterpret_cast<HostObject*>(self);
+    if (id < 1 || id > 4 || !o->members[id - 1]) return KG_E_MEMBERNOTFOUND;
+    const char* member = o->members[id - 1];
+    const bool cell = strcasecmp(member, "textmatrix") == 0;
+    std::string call = member;
+    if (cell && argc == 2)
         call += "(" + std::to_string(wholeArg(args[0])) + "," + std::to_string(wholeArg(args[1])) + ")";
-    g->log->calls.push_back(call);
-    if (fails(g->failure, names[id])) return fail(g->failure, error);
-    if (id != kTextMatrix) {
+    o->log->calls.push_back(call);
+    const HostFailure& f = o->failure;
+    if (f.member && strcasecmp(f.member, member) == 0) {
+        if (error) {
+            error->number = f.number;
+            std::snprintf(error->description, sizeof error->description, "%s", f.description);
+            std::snprintf(error->source, sizeof error->source, "%s", "TavixHost");
+        }
+        return f.status;
+    }
+    if (o->grid1) return argc != 0 ? KG_E_BADPARAMCOUNT : KGVariantSetObject(result, &o->grid1->base);
+    if (!cell) {
         KGVariantClear(result);
         result->vt = KG_VT_I4;
-        result->lVal = id == kRows ? g->rows : id == kFixedRows ? g->fixedRows : g->cols;
+        result->lVal = id == 1 ? o->rows : id == 2 ? o->fixedRows : o->cols;
         return KG_S_OK;
     }
     if (argc != 2) return KG_E_BADPARAMCOUNT;
     const int32_t r = wholeArg(args[0]), c = wholeArg(args[1]);
-    if (r < 0 || r >= g->rows || c < 0 || c >= g->cols) return KG_E_BADINDEX;
-    return KGVariantSetString(result, g->cells[r * g->cols + c]);
+    if (r < 0 || r >= o->rows || c < 0 || c >= o->cols) return KG_E_BADINDEX;
+    return KGVariantSetString(result, o->cells[r * o->cols + c]);
 }
 
-inline const KGObjectVtbl kGridVtbl = {gridAddRef, gridRelease, gridGetIDOfName, gridInvoke};
-
-inline uint32_t formAddRef(KGObject* self) { return ++reinterpret_cast<HostForm*>(self)->refs; }
-inline uint32_t formRelease(KGObject* self)
-{
-    HostForm* f = reinterpret_cast<HostForm*>(self);
-    const uint32_t left = --f->refs;
-    if (left == 0) {
-        KGRelease(&f->grid1->base);
-        --f->log->alive;
-        delete f;
-    }
-    return left;
-}
-
-inline int32_t formGetIDOfName(KGObject*, const char* name, int32_t* id)
-{
-    if (strcasecmp(name, "grid1") != 0) return KG_E_UNKNOWNNAME;
-    *id = kGrid1;
-    return KG_S_OK;
-}
-
-inline int32_t formInvoke(KGObject* self, int32_t id, uint16_t, KGVariant*, uint32_t argc, KGVariant* result,
-                          KGErrorInfo* error)
-{
-    HostForm* f = reinterpret_cast<HostForm*>(self);
-    if (id != kGrid1) return KG_E_MEMBERNOTFOUND;
-    f->log->calls.push_back("grid1");
-    if (fails(f->failure, "grid1")) return fail(f->failure, error);
-    if (argc != 0) return KG_E_BADPARAMCOUNT;
-    return KGVariantSetObject(result, &f->grid1->base);
-}
-
-inline const KGObjectVtbl kFormVtbl = {formAddRef, formRelease, formGetIDOfName, formInvoke};
+inline const KGObjectVtbl kVtbl = {addRef, release, getIDOfName, invoke};
 
 }  // namespace hostform
 
-// A new form (one reference for the caller) whose grid1 shows `cells`.
+// A new form (one reference for the caller) whose grid1 shows `cells`; `failure` names a member of
+// either.
 inline KGObject* makeHostForm(HostLog& log, int32_t rows, int32_t fixedRows, int32_t cols, const char* const* cells,
-                              HostFailure formFailure = {}, HostFailure gridFailure = {})
+                              const HostFailure& failure = {})
 {
-    auto* grid = new HostGrid{{&hostform::kGridVtbl}, 1, rows, fixedRows, cols, cells, gridFailure, &log};
-    auto* form = new HostForm{{&hostform::kFormVtbl}, 1, grid, formFailure, &log};
+    auto* grid = new HostObject{{&hostform::kVtbl}, 1, {"Rows", "FixedRows", "cols", "textmatrix"}, failure, &log,
+                                nullptr, rows, fixedRows, cols, cells};
+    auto* form = new HostObject{{&hostform::kVtbl}, 1, {"grid1", nullptr, nullptr, nullptr}, failure, &log, grid,
+                                0, 0, 0, nullptr};
     log.alive += 2;
     return &form->base;
 }

@@ -46,7 +46,7 @@ INSTANTIATE_TEST_SUITE_P(Cases, ArrayCreateTest,
                                            Bounds{"UpperBelowLower", 0, -1, 0, 3, false},
                                            Bounds{"SecondUpperBelowLower", 0, 3, 5, 4, false},
                                            Bounds{"TooLargeToMean", 0, 100000, 0, 100000, false}),
-                         [](const auto& info) { return std::string(info.param.name); });
+                         byName);
 
 TEST(VariantTest, CopyOfAStringIsItsOwn)
 {

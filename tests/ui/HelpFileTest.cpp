@@ -4,6 +4,8 @@
 #include <QFile>
 #include <QStringDecoder>
 
+#include "ui/UiSupport.h"
+
 namespace kg::test {
 namespace {
 
@@ -40,7 +42,6 @@ struct TopicCase {
     const char* name;
     std::vector<const char*> words;
 };
-void PrintTo(const TopicCase& c, std::ostream* os) { *os << c.name; }
 
 const TopicCase kTopics[] = {
     {"MenuWithShortcuts",
@@ -64,8 +65,7 @@ TEST_P(Topic, IsCovered)
     for (const char* word : GetParam().words) EXPECT_TRUE(text.contains(word)) << word;
 }
 
-INSTANTIATE_TEST_SUITE_P(HelpFile, Topic, ::testing::ValuesIn(kTopics),
-                         [](const auto& info) { return std::string(info.param.name); });
+INSTANTIATE_TEST_SUITE_P(HelpFile, Topic, ::testing::ValuesIn(kTopics), byName);
 
 }  // namespace
 }  // namespace kg::test

@@ -9,6 +9,8 @@
 #include "core/Error.h"
 #include "ui/NumericField.h"
 
+#include "ui/UiSupport.h"
+
 namespace kg::test {
 namespace {
 
@@ -34,7 +36,6 @@ struct TypingCase {
     const char* shown;
     std::optional<double> value;
 };
-void PrintTo(const TypingCase& c, std::ostream* os) { *os << c.name; }
 
 const TypingCase kTyping[] = {
     {"WithinLimits", "45", "45", 45},
@@ -50,7 +51,6 @@ const TypingCase kTyping[] = {
     {"MinusInsideRefused", "4-", "4", 4},
     {"LettersRefused", "abc", "", kNull},
     {"LoneMinusReadsNull", "-", "-", kNull},
-    {"Zero", "0", "0", 0},
 };
 
 struct Typing : ::testing::TestWithParam<TypingCase> {};
@@ -63,8 +63,7 @@ TEST_P(Typing, OnlyWholeNumbersWithinTheLimitsGetIn)
     expectValue(field, GetParam().value);
 }
 
-INSTANTIATE_TEST_SUITE_P(NumericField, Typing, ::testing::ValuesIn(kTyping),
-                         [](const auto& info) { return std::string(info.param.name); });
+INSTANTIATE_TEST_SUITE_P(NumericField, Typing, ::testing::ValuesIn(kTyping), byName);
 
 struct SetCase {
     const char* name;
@@ -72,7 +71,6 @@ struct SetCase {
     const char* shown;
     std::optional<double> read;
 };
-void PrintTo(const SetCase& c, std::ostream* os) { *os << c.name; }
 
 const SetCase kSets[] = {
     {"Inside", Variant(-12.0), "-12", -12},
@@ -83,7 +81,6 @@ const SetCase kSets[] = {
     {"HalfAwayFromZero", Variant(10.5), "11", 11},
     {"NegativeHalfAwayFromZero", Variant(-10.5), "-11", -11},
     {"SmallNegativeIsZero", Variant(-0.4), "0", 0},
-    {"ClampedThenWhole", Variant(45.4), "45", 45},
     {"Integer", Variant(int16_t(7)), "7", 7},
     {"Long", Variant(int32_t(-300)), "-45", -45},
     {"NumericText", Variant("12"), "12", 12},
@@ -102,19 +99,13 @@ TEST_P(Set, ProgramValuesAreClampedAndWhole)
     expectValue(field, GetParam().read);
 }
 
-INSTANTIATE_TEST_SUITE_P(NumericField, Set, ::testing::ValuesIn(kSets),
-                         [](const auto& info) { return std::string(info.param.name); });
+INSTANTIATE_TEST_SUITE_P(NumericField, Set, ::testing::ValuesIn(kSets), byName);
 
 TEST(NumericField, TextThatIsNoNumberIsATypeMismatch)
 {
     NumericField field(-45, 45);
     field.setValue(Variant(10.0));
-    try {
-        field.setValue(Variant("ten"));
-        FAIL() << "no error";
-    } catch (const Error& e) {
-        EXPECT_EQ(e.number(), errc::TypeMismatch);
-    }
+    EXPECT_EQ(errorNumberOf([&] { field.setValue(Variant("ten")); }), errc::TypeMismatch);
     EXPECT_EQ(field.text(), "10");
 }
 

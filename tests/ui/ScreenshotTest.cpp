@@ -28,7 +28,6 @@ struct ShotCase {
     std::function<QWidget*()> open;  // the window, shown
     QSize size;
 };
-void PrintTo(const ShotCase& c, std::ostream* os) { *os << c.name; }
 
 const ShotCase kShots[] = {
     {"ChartStyleDialog",
@@ -61,8 +60,7 @@ TEST_P(Screenshot, HasTheDesignedSizeAndIsNotBlank)
     EXPECT_GT(drawnShare(image), 0.02);
 }
 
-INSTANTIATE_TEST_SUITE_P(Windows, Screenshot, ::testing::ValuesIn(kShots),
-                         [](const auto& info) { return std::string(info.param.name); });
+INSTANTIATE_TEST_SUITE_P(Windows, Screenshot, ::testing::ValuesIn(kShots), byName);
 
 }  // namespace
 }  // namespace kg::test

@@ -8,6 +8,7 @@
 #include "host/FaultPlan.h"
 #include "host/SettingsFile.h"
 #include "support/RequestFixture.h"
+#include "ui/UiSupport.h"
 #include "ui/Prompter.h"
 
 namespace kg::test {

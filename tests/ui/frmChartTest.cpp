@@ -104,7 +104,7 @@ TEST_F(WindowFixture, MenuIsAsTheHostKnowsIt)
         ASSERT_TRUE(action) << item.name;
         EXPECT_EQ(action->text(), item.caption);
         EXPECT_EQ(action->shortcut(), item.key) << item.name;
-        if (action != w.mnuRedraw) EXPECT_TRUE(action->isEnabled()) << item.name;  // hidden counts as disabled
+        EXPECT_TRUE(action == w.mnuRedraw || action->isEnabled()) << item.name;  // hidden counts as disabled
         // The host's items come first, in their order.
         EXPECT_EQ(w.mnuTop[item.menu]->actions().at(position[item.menu]++), action) << item.name;
     }
@@ -194,7 +194,7 @@ TEST_P(Redraw, FollowsTheRecordedChartKind)
     EXPECT_EQ(window().Chart1().header.text, *c.header ? c.header : "Qty of Bookings: Total =  3");
     EXPECT_EQ(modMain::giChartKind, c.chartKind);
     EXPECT_EQ(uiServices().mousePointer(), kPointerDefault);
-    if (*c.header) EXPECT_TRUE(window().mnuRedraw->isVisible());
+    EXPECT_TRUE(!*c.header || window().mnuRedraw->isVisible());
 }
 
 INSTANTIATE_TEST_SUITE_P(
@@ -203,8 +203,7 @@ INSTANTIATE_TEST_SUITE_P(
                       RedrawCase{"prop", 4, 0, "", 0}, RedrawCase{"hourly", 5, 0, "", 0},
                       RedrawCase{"bookings", 1, 2, "Quote Type by Average Value", 1},
                       RedrawCase{"categories", 2, 6, "Category by %Jobs and % $Value", 1},
-                      RedrawCase{"cancelled", 1, kChoiceCancelled, "", 1}),
-    [](const auto& info) { return std::string(info.param.name); });
+                      RedrawCase{"cancelled", 1, kChoiceCancelled, "", 1}), test::byName);
 
 TEST_F(WindowFixture, MeasureRequestsThroughTheRealDialog)
 {
@@ -234,7 +233,7 @@ TEST_F(WindowFixture, SetupRedrawsAfterOkAndAfterCancel)
             (ok ? setup.Command1 : setup.Command2)->click();
         });
         window().mnuSetup->trigger();
-        EXPECT_EQ(window().Chart1().group1.chartType, ok ? control::kPlot : control::kPlot) << ok;
+        EXPECT_EQ(window().Chart1().group1.chartType, control::kPlot) << ok;
     }
     EXPECT_TRUE(prompts->messages.empty());
 }
