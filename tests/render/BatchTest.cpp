@@ -11,7 +11,7 @@ namespace {
 struct BatchCase {
     const char* name;
     std::function<void(ChartControl&)> change;
-    int whileBatched, afterBatch;
+    int afterBatch;  // none while batched
 };
 
 class BatchRepaintTest : public ::testing::TestWithParam<BatchCase> {};
@@ -24,30 +24,31 @@ TEST_P(BatchRepaintTest, ListenerHearsOnceAfterTheBatch)
     chart.setChangeListener([&calls] { ++calls; });
     chart.data().setBatched(true);
     GetParam().change(chart);
-    EXPECT_EQ(calls, GetParam().whileBatched);
+    EXPECT_EQ(calls, 0);
     chart.data().setBatched(false);
     EXPECT_EQ(calls, GetParam().afterBatch);
 }
 
-INSTANTIATE_TEST_SUITE_P(Changes, BatchRepaintTest,
-                         ::testing::Values(BatchCase{"nothingChanged", [](ChartControl&) {}, 0, 0},
-                                           BatchCase{"oneValue", [](ChartControl& c) { c.data().setY(1, 1, 5); }, 0, 1},
-                                           BatchCase{"wholeTable",
-                                                     [](ChartControl& c) {
-                                                         c.data().setSeriesCount(4);
-                                                         for (int s = 1; s <= 4; ++s) {
-                                                             c.data().setPointCount(s, 10);
-                                                             for (int p = 1; p <= 10; ++p) c.data().setY(s, p, s * p);
-                                                         }
-                                                     },
-                                                     0, 1},
-                                           BatchCase{"labels",
-                                                     [](ChartControl& c) {
-                                                         c.clearChartLabels();
-                                                         samples::addValueLabel(c, 1, 1, " 1");
-                                                     },
-                                                     0, 1}),
-                         [](const auto& info) { return std::string(info.param.name); });
+INSTANTIATE_TEST_SUITE_P(
+    Changes, BatchRepaintTest,
+    ::testing::Values(BatchCase{"nothingChanged", [](ChartControl&) {}, 0},
+                      BatchCase{"oneValue", [](ChartControl& c) { c.data().setY(1, 1, 5); }, 1},
+                      BatchCase{"wholeTable",
+                                [](ChartControl& c) {
+                                    c.data().setSeriesCount(4);
+                                    for (int s = 1; s <= 4; ++s) {
+                                        c.data().setPointCount(s, 10);
+                                        for (int p = 1; p <= 10; ++p) c.data().setY(s, p, s * p);
+                                    }
+                                },
+                                1},
+                      BatchCase{"labels",
+                                [](ChartControl& c) {
+                                    c.clearChartLabels();
+                                    samples::addValueLabel(c, 1, 1, " 1");
+                                },
+                                1}),
+    samples::rowName);
 
 }  // namespace
 }  // namespace kg::control

@@ -49,35 +49,29 @@ INSTANTIATE_TEST_SUITE_P(
                                       QString::fromUtf8("\xD0\x98\xD1\x82\xD0\xBE\xD0\xB3 \xE5\x90\x88\xE8\xA8\x88")},
                       DisplayTextCase{"megabyteCutToWhatAPageShows", kLongCaption, QString(2000, QLatin1Char('x'))},
                       DisplayTextCase{"cutNeverSplitsACharacter", kCutInAPair, QString(1999, QLatin1Char('a'))}),
-    [](const auto& info) { return std::string(info.param.name); });
+    samples::rowName);
 
+// Header and footer are centred at the ends; an empty footer takes no room.
 TEST(LayoutTest, HeaderAndFooterAreCentredAtTheEnds)
 {
     ChartControl c;
-    barChart(c, 2, 3).footer.text = "Footer";
+    const ChartLayout without = computeLayout(barChart(c, 2, 3), kTarget);
+    c.footer.text = "Footer";
     const ChartLayout L = computeLayout(c, kTarget);
     EXPECT_NEAR(L.header.center().x(), 400, 0.5);
     EXPECT_NEAR(L.footer.center().x(), 400, 0.5);
     EXPECT_LT(L.header.bottom(), L.chartArea.top());
     EXPECT_GT(L.footer.top(), L.chartArea.bottom());
-}
-
-TEST(LayoutTest, EmptyFooterTakesNoRoom)
-{
-    ChartControl c;
-    barChart(c, 2, 3);
-    const ChartLayout without = computeLayout(c, kTarget);
-    c.footer.text = "Footer";
-    const ChartLayout with = computeLayout(c, kTarget);
     EXPECT_TRUE(without.footer.isEmpty());
-    EXPECT_GT(without.chartArea.bottom(), with.chartArea.bottom());
+    EXPECT_GT(without.chartArea.bottom(), L.chartArea.bottom());
 }
 
 struct LegendCase {
     const char* name;
     int series;
-    bool shown;
-    bool expectLegend;
+    bool shown, labelled;  // a legend only when both
+    bool truncated;        // more entries than room: the last one says so
+    QRectF target = kTarget;
 };
 
 class LegendPlacementTest : public ::testing::TestWithParam<LegendCase> {};
@@ -86,12 +80,16 @@ TEST_P(LegendPlacementTest, EastOfThePlotVerticallyCentredWithoutOverlaps)
 {
     ChartControl c;
     barChart(c, GetParam().series, 4).legend.isShown = GetParam().shown;
-    const ChartLayout L = computeLayout(c, kTarget);
-    ASSERT_EQ(!L.legend.isEmpty(), GetParam().expectLegend);
-    if (!GetParam().expectLegend) return;
+    if (!GetParam().labelled) c.group1.seriesLabels.clear();
+    const ChartLayout L = computeLayout(c, GetParam().target);
+    ASSERT_EQ(!L.legend.isEmpty(), GetParam().shown && GetParam().labelled);
+    EXPECT_EQ(L.legendTruncated, GetParam().truncated);
+    if (L.legend.isEmpty()) return;
+    EXPECT_EQ(L.legendItems.size() < size_t(GetParam().series), GetParam().truncated);
+    EXPECT_EQ(L.legendItems.back().text == QStringLiteral("\u2026"), GetParam().truncated);
     EXPECT_GE(L.legend.left(), L.chartArea.right() + c.legend.layout1 - 0.5);
     EXPECT_NEAR(L.legend.center().y(), L.chartArea.center().y(), 0.5);
-    EXPECT_LE(L.legend.right(), kTarget.right());
+    EXPECT_LE(L.legend.right(), GetParam().target.right());
     EXPECT_GE(L.legend.top(), L.chartArea.top() - 0.5);
     const ChartFonts fonts(c);
     for (size_t i = 0; i < L.legendItems.size(); ++i) {
@@ -108,30 +106,14 @@ TEST_P(LegendPlacementTest, EastOfThePlotVerticallyCentredWithoutOverlaps)
 }
 
 INSTANTIATE_TEST_SUITE_P(Legends, LegendPlacementTest,
-                         ::testing::Values(LegendCase{"tenSeries", 10, true, true},
-                                           LegendCase{"hidden", 10, false, false},
-                                           LegendCase{"oneSeries", 1, true, true},
-                                           LegendCase{"twoHundredSeries", 200, true, true}),
-                         [](const auto& info) { return std::string(info.param.name); });
-
-TEST(LayoutTest, LegendWithMoreEntriesThanRoomSaysSo)
-{
-    ChartControl c;
-    barChart(c, 600, 2);
-    const ChartLayout L = computeLayout(c, QRectF(0, 0, 400, 300));
-    EXPECT_TRUE(L.legendTruncated);
-    ASSERT_FALSE(L.legendItems.empty());
-    EXPECT_LT(L.legendItems.size(), size_t(600));
-    EXPECT_EQ(L.legendItems.back().text.toStdString(), "\u2026");
-}
-
-TEST(LayoutTest, LegendWithoutAnyTextIsLeftOut)
-{
-    ChartControl c;
-    samples::styleLikeTheChartObject(c);
-    samples::fillTable(c, 3, 4, kBar);
-    EXPECT_TRUE(computeLayout(c, kTarget).legend.isEmpty());
-}
+                         ::testing::Values(LegendCase{"tenSeries", 10, true, true, false},
+                                           LegendCase{"hidden", 10, false, true, false},
+                                           LegendCase{"withoutAnyText", 3, true, false, false},
+                                           LegendCase{"oneSeries", 1, true, true, false},
+                                           LegendCase{"twoHundredSeries", 200, true, true, true},
+                                           LegendCase{"sixHundredInASmallWindow", 600, true, true, true,
+                                                      QRectF(0, 0, 400, 300)}),
+                         samples::rowName);
 
 struct LegendTextCase {
     const char* name;
@@ -163,7 +145,7 @@ INSTANTIATE_TEST_SUITE_P(
                       LegendTextCase{"piePointLabelsCoverMore", kPie, {"Bookings"}, {"x", "y", "z"}, {"x", "y", "z"}},
                       LegendTextCase{"pieMissingEntriesEmpty", kPie, {"a", "b"}, {}, {"a", "b", ""}},
                       LegendTextCase{"leadingBlankKept", kBar, {" 5", "b", "c"}, {}, {" 5", "b", "c"}}),
-    [](const auto& info) { return std::string(info.param.name); });
+    samples::rowName);
 
 struct XLabelCase {
     const char* name;
@@ -171,20 +153,27 @@ struct XLabelCase {
     std::string stem;
     QRectF target;
     bool allShown;
+    int16_t annotationMethod = 2;  // 2: the point labels; otherwise the point numbers
 };
 
 class XLabelTest : public ::testing::TestWithParam<XLabelCase> {};
 
-// Texts along the X axis never overlap: side by side they keep apart, turned ones keep a line apart.
-TEST_P(XLabelTest, PointLabelsNeverOverlap)
+// The X axis shows whole point numbers or the point labels; its texts never overlap: side by side
+// they keep apart, turned ones keep a line apart.
+TEST_P(XLabelTest, PointTextsNeverOverlap)
 {
     ChartControl c;
-    barChart(c, 10, GetParam().points);
+    barChart(c, 10, GetParam().points).chartArea.x.annotationMethod = GetParam().annotationMethod;
     samples::addPointLabels(c, GetParam().points, GetParam().stem);
     const ChartLayout L = computeLayout(c, GetParam().target);
     const ChartFonts fonts(c);
     ASSERT_FALSE(L.xLabels.empty());
     EXPECT_EQ(L.xLabels.size() == size_t(GetParam().points), GetParam().allShown);
+    const std::string stem = GetParam().annotationMethod == 2 ? GetParam().stem : "";
+    for (const AxisLabel& a : L.xLabels) {
+        EXPECT_EQ(a.value, std::floor(a.value));
+        EXPECT_EQ(a.text.toStdString(), stem + QString::number(a.value).toStdString());
+    }
     for (size_t i = 1; i < L.xLabels.size(); ++i) {
         const double gap = L.mapping.xPixel(L.xLabels[i].value) - L.mapping.xPixel(L.xLabels[i - 1].value);
         if (L.xLabelsRotated) {
@@ -201,20 +190,10 @@ INSTANTIATE_TEST_SUITE_P(Labels, XLabelTest,
                          ::testing::Values(XLabelCase{"shortSideBySide", 12, "M", kTarget, true},
                                            XLabelCase{"monthNames", 12, "September ", kTarget, true},
                                            XLabelCase{"thousandPoints", 1000, "Hour ", QRectF(0, 0, 1600, 1000), false},
-                                           XLabelCase{"narrowWindow", 31, "Day ", QRectF(0, 0, 300, 240), false}),
-                         [](const auto& info) { return std::string(info.param.name); });
-
-TEST(LayoutTest, NumberedXAxisShowsWholePointNumbers)
-{
-    ChartControl c;
-    barChart(c, 3, 12).chartArea.x.annotationMethod = 0;
-    const ChartLayout L = computeLayout(c, kTarget);
-    ASSERT_FALSE(L.xLabels.empty());
-    for (const AxisLabel& a : L.xLabels) {
-        EXPECT_EQ(a.value, std::floor(a.value));
-        EXPECT_EQ(a.text.toDouble(), a.value);
-    }
-}
+                                           XLabelCase{"narrowWindow", 31, "Day ", QRectF(0, 0, 300, 240), false},
+                                           XLabelCase{"numbers", 12, "Week ", kTarget, true, 1},
+                                           XLabelCase{"notSetNumbers", 12, "Week ", kTarget, true, 0}),
+                         samples::rowName);
 
 TEST(LayoutTest, YTicksAreRoundAndCoverTheData)
 {
@@ -228,22 +207,6 @@ TEST(LayoutTest, YTicksAreRoundAndCoverTheData)
     EXPECT_LE(L.yLabels.size(), size_t(12));
     const double mantissa = L.yScale.step / std::pow(10.0, std::floor(std::log10(L.yScale.step)));
     EXPECT_TRUE(mantissa == 1 || mantissa == 2 || mantissa == 2.5 || mantissa == 5) << mantissa;
-}
-
-TEST(LayoutTest, AxisZoomSetsTheRange)
-{
-    ChartControl c;
-    barChart(c, 3, 5);
-    c.chartArea.y.hasFixedRange = true;
-    c.chartArea.y.min = 20;
-    c.chartArea.y.max = 60;
-    const ChartLayout L = computeLayout(c, kTarget);
-    EXPECT_EQ(L.mapping.yMin, 20);
-    EXPECT_EQ(L.mapping.yMax, 60);
-    for (const AxisLabel& a : L.yLabels) {
-        EXPECT_GE(a.value, 20);
-        EXPECT_LE(a.value, 60);
-    }
 }
 
 TEST(LayoutTest, ValueLabelsGetRoomAboveTheHighestBar)
@@ -283,12 +246,13 @@ INSTANTIATE_TEST_SUITE_P(Views, DepthTest,
                                            DepthCase{"rotationOnly", {20, 0, 10}, false},
                                            DepthCase{"elevationOnly", {0, 20, 10}, false},
                                            DepthCase{"negativeAngles", {-20, -20, 60}, false}),
-                         [](const auto& info) { return std::string(info.param.name); });
+                         samples::rowName);
 
 struct PieCase {
     const char* name;
     std::vector<double> values;
     std::vector<int32_t> slices;
+    View3D view{0, 0, 0};  // a 3-D view tilts the pie and gives it a rim
 };
 
 class PieSliceTest : public ::testing::TestWithParam<PieCase> {};
@@ -297,7 +261,15 @@ TEST_P(PieSliceTest, PositiveValuesShareTheCircle)
 {
     ChartControl c;
     samples::fillPie(c, GetParam().values);
+    c.chartArea.view3D = GetParam().view;
     const ChartLayout L = computeLayout(c, kTarget);
+    if (GetParam().view.depth == 0) {
+        EXPECT_EQ(L.pie.rx, L.pie.ry);
+        EXPECT_EQ(L.pie.rim, 0);
+    } else {
+        EXPECT_LT(L.pie.ry, L.pie.rx * 0.75);
+        EXPECT_GT(L.pie.rim, 0);
+    }
     std::vector<int32_t> series;
     double total = 0;
     for (const PieSlice& s : L.pie.slices) {
@@ -315,21 +287,9 @@ INSTANTIATE_TEST_SUITE_P(Pies, PieSliceTest,
                          ::testing::Values(PieCase{"allPositive", {1, 2, 3}, {1, 2, 3}},
                                            PieCase{"zeroSkipped", {1, 0, 3}, {1, 3}},
                                            PieCase{"negativeSkipped", {-1, 2, 3}, {2, 3}},
-                                           PieCase{"nothingPositive", {0, -2}, {}}, PieCase{"none", {}, {}}),
-                         [](const auto& info) { return std::string(info.param.name); });
-
-TEST(LayoutTest, PieIsTiltedAndHasARimIn3D)
-{
-    ChartControl c;
-    samples::fillPie(c, {1, 2, 3});
-    const ChartLayout flat = computeLayout(c, kTarget);
-    EXPECT_EQ(flat.pie.rx, flat.pie.ry);
-    EXPECT_EQ(flat.pie.rim, 0);
-    c.chartArea.view3D = {0, 45, 20};
-    const ChartLayout tilted = computeLayout(c, kTarget);
-    EXPECT_LT(tilted.pie.ry, tilted.pie.rx * 0.75);
-    EXPECT_GT(tilted.pie.rim, 0);
-}
+                                           PieCase{"nothingPositive", {0, -2}, {}}, PieCase{"none", {}, {}},
+                                           PieCase{"tilted3D", {1, 2, 3}, {1, 2, 3}, {0, 45, 20}}),
+                         samples::rowName);
 
 struct ViewCase {
     const char* name;
@@ -338,16 +298,28 @@ struct ViewCase {
 
 class ViewMappingTest : public ::testing::TestWithParam<ViewCase> {};
 
-TEST_P(ViewMappingTest, DataValuesRoundTripThroughScreenPositions)
+// Only the chart area's content moves: scaled about its centre, then moved by the offsets times
+// its size; data values still round-trip through screen positions.
+TEST_P(ViewMappingTest, MovesTheChartAreaContentOnly)
 {
     ChartControl c;
-    barChart(c, 3, 12).view = GetParam().view;
+    const ChartLayout plain = computeLayout(barChart(c, 3, 12), kTarget);
+    const ViewState& v = GetParam().view;
+    c.view = v;
     const ChartLayout L = computeLayout(c, kTarget);
-    for (const QPointF& v : {QPointF(1, 0), QPointF(6.5, 42), QPointF(12, 88.25)}) {
+    EXPECT_EQ(L.header, plain.header);
+    EXPECT_EQ(L.legend, plain.legend);
+    EXPECT_EQ(L.chartArea, plain.chartArea);
+    const QPointF centre = plain.chartContent.center();
+    const QPointF movedCentre = L.view.map(centre);
+    EXPECT_NEAR(movedCentre.x(), centre.x() + v.offsetX * plain.chartContent.width(), 1e-9);
+    EXPECT_NEAR(movedCentre.y(), centre.y() + v.offsetY * plain.chartContent.height(), 1e-9);
+    EXPECT_NEAR(L.toScreen(1, 0).x() - movedCentre.x(), v.scale * (plain.toScreen(1, 0).x() - centre.x()), 1e-9);
+    for (const QPointF& value : {QPointF(1, 0), QPointF(6.5, 42), QPointF(12, 88.25)}) {
         QPointF back;
-        ASSERT_TRUE(L.toValue(L.toScreen(v.x(), v.y()), back));
-        EXPECT_NEAR(back.x(), v.x(), 1e-9);
-        EXPECT_NEAR(back.y(), v.y(), 1e-9);
+        ASSERT_TRUE(L.toValue(L.toScreen(value.x(), value.y()), back));
+        EXPECT_NEAR(back.x(), value.x(), 1e-9);
+        EXPECT_NEAR(back.y(), value.y(), 1e-9);
     }
 }
 
@@ -355,24 +327,7 @@ INSTANTIATE_TEST_SUITE_P(Views, ViewMappingTest,
                          ::testing::Values(ViewCase{"identity", {}}, ViewCase{"scaled", {2, 0, 0}},
                                            ViewCase{"moved", {1, 0.25, -0.1}},
                                            ViewCase{"scaledAndMoved", {0.5, -0.2, 0.3}}),
-                         [](const auto& info) { return std::string(info.param.name); });
-
-TEST(LayoutTest, ViewStateMovesOnlyTheChartAreaContent)
-{
-    ChartControl c;
-    barChart(c, 3, 12);
-    const ChartLayout plain = computeLayout(c, kTarget);
-    c.view = {2, 0.1, 0.1};
-    const ChartLayout zoomed = computeLayout(c, kTarget);
-    EXPECT_EQ(zoomed.header, plain.header);
-    EXPECT_EQ(zoomed.legend, plain.legend);
-    EXPECT_EQ(zoomed.chartArea, plain.chartArea);
-    const QPointF centre = plain.chartContent.center();
-    // Scaled about the centre of the chart area, then moved by a tenth of its size.
-    EXPECT_NEAR(zoomed.view.map(centre).x(), centre.x() + 0.1 * plain.chartContent.width(), 1e-9);
-    EXPECT_NEAR(zoomed.toScreen(1, 0).x() - zoomed.view.map(centre).x(), 2 * (plain.toScreen(1, 0).x() - centre.x()),
-                1e-9);
-}
+                         samples::rowName);
 
 struct KindCase {
     const char* name;
@@ -389,7 +344,7 @@ INSTANTIATE_TEST_SUITE_P(Codes, ChartKindTest,
                                            KindCase{"pie", 3, ChartKind::Pie}, KindCase{"area", 5, ChartKind::Area},
                                            KindCase{"notSet", 0, ChartKind::Bar}, KindCase{"four", 4, ChartKind::Bar},
                                            KindCase{"negative", -1, ChartKind::Bar}),
-                         [](const auto& info) { return std::string(info.param.name); });
+                         samples::rowName);
 
 }  // namespace
 }  // namespace kg::control

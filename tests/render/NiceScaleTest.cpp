@@ -4,6 +4,7 @@
 #include <cmath>
 
 #include "chart/control/render/NiceScale.h"
+#include "render/RenderSamples.h"
 
 namespace kg::control {
 namespace {
@@ -31,7 +32,7 @@ INSTANTIATE_TEST_SUITE_P(Steps, NiceStepTest,
                                            StepCase{"largeSpan", 3.2e9, 8, 5e8}, StepCase{"zeroSpan", 0, 5, 1},
                                            StepCase{"infiniteSpanKeptFinite", INFINITY, 5, 2e299},
                                            StepCase{"negativeSpan", -100, 10, 10}),
-                         [](const auto& info) { return std::string(info.param.name); });
+                         samples::rowName);
 
 struct AutoCase {
     const char* name;
@@ -61,25 +62,31 @@ INSTANTIATE_TEST_SUITE_P(
                       AutoCase{"bothSides", -12, 47, 10, -20, 50, 10}, AutoCase{"allZero", 0, 0, 10, 0, 1, 0.1},
                       AutoCase{"oneValue", 5, 5, 5, 0, 5, 1}, AutoCase{"fractions", 0.02, 0.37, 8, 0, 0.4, 0.05},
                       AutoCase{"millions", 1.2e6, 9.7e6, 10, 0, 1e7, 1e6}),
-    [](const auto& info) { return std::string(info.param.name); });
+    samples::rowName);
 
-TEST(FixedScaleTest, KeepsTheGivenRangeWithTicksInside)
+struct FixedCase {
+    const char* name;
+    double min, max;
+    int intervals;
+    double minStep;
+    std::vector<double> ticks;
+};
+
+class FixedScaleTest : public ::testing::TestWithParam<FixedCase> {};
+
+TEST_P(FixedScaleTest, KeepsTheGivenRangeWithRoundTicksInside)
 {
-    const AxisScale s = fixedScale(13, 87, 8);
-    EXPECT_DOUBLE_EQ(s.min, 13);
-    EXPECT_DOUBLE_EQ(s.max, 87);
-    ASSERT_FALSE(s.ticks.empty());
-    EXPECT_GE(s.ticks.front(), 13);
-    EXPECT_LE(s.ticks.back(), 87);
-    EXPECT_DOUBLE_EQ(s.ticks.front(), 20);
+    const FixedCase& c = GetParam();
+    const AxisScale s = fixedScale(c.min, c.max, c.intervals, c.minStep);
+    EXPECT_DOUBLE_EQ(s.min, c.min);
+    EXPECT_DOUBLE_EQ(s.max, c.max);
+    EXPECT_EQ(s.ticks, c.ticks);
 }
 
-TEST(FixedScaleTest, WholeStepsStayWhole)
-{
-    const AxisScale s = fixedScale(0.5, 3.5, 20, 1);
-    EXPECT_DOUBLE_EQ(s.step, 1);
-    EXPECT_EQ(s.ticks, (std::vector<double>{1, 2, 3}));
-}
+INSTANTIATE_TEST_SUITE_P(Ranges, FixedScaleTest,
+                         ::testing::Values(FixedCase{"ticksInside", 13, 87, 8, 0, {20, 30, 40, 50, 60, 70, 80}},
+                                           FixedCase{"wholeStepsStayWhole", 0.5, 3.5, 20, 1, {1, 2, 3}}),
+                         samples::rowName);
 
 struct TextCase {
     const char* name;
@@ -101,7 +108,7 @@ INSTANTIATE_TEST_SUITE_P(
                       TextCase{"negative", -20, 10, "-20"}, TextCase{"negativeNearZero", -1e-17, 0.1, "0"},
                       TextCase{"thousands", 12500, 2500, "12500"}, TextCase{"small", 0.0005, 0.0005, "0.0005"},
                       TextCase{"huge", 2e20, 1e20, "2e+20"}),
-    [](const auto& info) { return std::string(info.param.name); });
+    samples::rowName);
 
 }  // namespace
 }  // namespace kg::control

@@ -1,12 +1,10 @@
 // Printing: one landscape page, to a PDF file when one is set; no printer is Error 482.
 #include <gtest/gtest.h>
 
-#include <QFile>
 #include <QPrinterInfo>
 #include <QRegularExpression>
 
 #include "chart/control/render/ChartPrinting.h"
-#include "core/Error.h"
 #include "render/RenderSamples.h"
 
 namespace kg::control {
@@ -24,12 +22,6 @@ protected:
     ChartControl chart;
 };
 
-QByteArray readAll(const QString& path)
-{
-    QFile f(path);
-    return f.open(QIODevice::ReadOnly) ? f.readAll() : QByteArray();
-}
-
 struct PrintCase {
     const char* name;
     PrintRequest request;
@@ -38,6 +30,7 @@ struct PrintCase {
 
 class PrintToPdfTest : public PrintTest, public ::testing::WithParamInterface<PrintCase> {};
 
+// Printed twice (the second replacing the first file), the chart itself unchanged.
 TEST_P(PrintToPdfTest, PrintsOneLandscapePage)
 {
     QTemporaryDir dir = samples::scratchDir();
@@ -45,8 +38,11 @@ TEST_P(PrintToPdfTest, PrintsOneLandscapePage)
     setPrintToPdfFile(path.toStdString());
     chart.shownWidth = GetParam().shownWidth;
     chart.shownHeight = GetParam().shownHeight;
+    const uint64_t revision = chart.revision();
     chart.print(GetParam().request);
-    const QByteArray pdf = readAll(path);
+    chart.print(GetParam().request);
+    EXPECT_EQ(chart.revision(), revision);
+    const QByteArray pdf = samples::readAll(path);
     ASSERT_TRUE(pdf.startsWith("%PDF"));
     EXPECT_EQ(pdf.count("/Type /Page\n") + pdf.count("/Type /Page "), 1);
     const QRegularExpressionMatch box =
@@ -61,42 +57,29 @@ INSTANTIATE_TEST_SUITE_P(Requests, PrintToPdfTest,
                                            PrintCase{"otherCodes", {-1, 99, 7, 7, 7, 7}, 0, 0},
                                            PrintCase{"shownWide", {3, 4, 0, 0, 0, 0}, 1200, 300},
                                            PrintCase{"shownTall", {3, 4, 0, 0, 0, 0}, 300, 900}),
-                         [](const auto& info) { return std::string(info.param.name); });
+                         samples::rowName);
 
-TEST_F(PrintTest, PrintingTwiceLeavesTheChartUnchanged)
+struct FailureCase {
+    const char* name;
+    const char* pdfFile;  // empty: to the default printer
+    const char* named;    // part of the description
+};
+
+class PrintFailureTest : public PrintTest, public ::testing::WithParamInterface<FailureCase> {};
+
+TEST_P(PrintFailureTest, IsAPrinterError)
 {
-    QTemporaryDir dir = samples::scratchDir();
-    setPrintToPdfFile(dir.filePath(QStringLiteral("twice.pdf")).toStdString());
-    const uint64_t revision = chart.revision();
-    chart.print({3, 4, 0, 0, 0, 0});
-    chart.print({3, 4, 0, 0, 0, 0});
-    EXPECT_EQ(chart.revision(), revision);
-    EXPECT_TRUE(readAll(dir.filePath(QStringLiteral("twice.pdf"))).startsWith("%PDF"));
+    if (!*GetParam().pdfFile && !QPrinterInfo::defaultPrinter().isNull())
+        GTEST_SKIP() << "this machine has a default printer";
+    setPrintToPdfFile(GetParam().pdfFile);
+    samples::expectError([&] { chart.print({3, 4, 0, 0, 0, 0}); }, errc::PrinterError, GetParam().named);
 }
 
-TEST_F(PrintTest, UnwritablePdfFileIsAPrinterErrorNamingIt)
-{
-    setPrintToPdfFile("/no/such/folder/printed.pdf");
-    try {
-        chart.print({3, 4, 0, 0, 0, 0});
-        FAIL() << "no error";
-    } catch (const Error& e) {
-        EXPECT_EQ(e.number(), errc::PrinterError);
-        EXPECT_NE(e.description().find("/no/such/folder/printed.pdf"), std::string::npos) << e.description();
-    }
-}
-
-TEST_F(PrintTest, NoPrinterInstalledIsAPrinterError)
-{
-    if (!QPrinterInfo::defaultPrinter().isNull()) GTEST_SKIP() << "this machine has a default printer";
-    try {
-        chart.print({3, 4, 0, 0, 0, 0});
-        FAIL() << "no error";
-    } catch (const Error& e) {
-        EXPECT_EQ(e.number(), errc::PrinterError);
-        EXPECT_EQ(e.description(), "Printer error: no printer is installed");
-    }
-}
+INSTANTIATE_TEST_SUITE_P(
+    Failures, PrintFailureTest,
+    ::testing::Values(FailureCase{"unwritablePdfFile", "/no/such/folder/printed.pdf", "/no/such/folder/printed.pdf"},
+                      FailureCase{"noPrinterInstalled", "", "Printer error: no printer is installed"}),
+    samples::rowName);
 
 }  // namespace
 }  // namespace kg::control

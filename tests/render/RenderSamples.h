@@ -1,12 +1,17 @@
 #pragma once
 // Charts for the render tests, filled the way the chart object fills the control: its colours,
 // borders and fonts, point labels on the X axis, the legend east of the plot.
+#include <gtest/gtest.h>
+
 #include <QDir>
+#include <QFile>
 #include <QTemporaryDir>
+#include <functional>
 #include <string>
 #include <vector>
 
 #include "chart/control/model/ChartControl.h"
+#include "core/Error.h"
 
 namespace kg::control::samples {
 
@@ -95,5 +100,26 @@ inline QTemporaryDir scratchDir()
     QDir().mkpath(base);
     return QTemporaryDir(base + QStringLiteral("/render-XXXXXX"));
 }
+
+inline QByteArray readAll(const QString& path)
+{
+    QFile f(path);
+    return f.open(QIODevice::ReadOnly) ? f.readAll() : QByteArray();
+}
+
+// Runs `call` and checks it fails with error `number` whose description contains `named`.
+inline void expectError(const std::function<void()>& call, int32_t number, const std::string& named)
+{
+    try {
+        call();
+        ADD_FAILURE() << "no error";
+    } catch (const Error& e) {
+        EXPECT_EQ(e.number(), number);
+        EXPECT_NE(e.description().find(named), std::string::npos) << e.description();
+    }
+}
+
+// Names each row of a table after its `name` field.
+inline const auto rowName = [](const auto& info) { return std::string(info.param.name); };
 
 }  // namespace kg::control::samples

@@ -1,5 +1,5 @@
 // SVG export: every text of the chart is a real text element, exactly as stored and escaped so
-// that the file stays well-formed XML.
+// that the file stays well-formed XML; the header is also the document's title.
 #include <gtest/gtest.h>
 
 #include <QFile>
@@ -68,6 +68,7 @@ TEST_P(SvgTextTest, TextAppearsExactlyAndTheFileParses)
     ASSERT_TRUE(svg.error.isEmpty()) << svg.error.toStdString();
     EXPECT_TRUE(svg.texts.contains(QString::fromUtf8(GetParam().text)))
         << "texts: " << svg.texts.join(QStringLiteral(" | ")).toStdString();
+    EXPECT_EQ(svg.title.toStdString(), chart.header.text);  // the document's title is the header
 }
 
 const auto kHeader = [](ChartControl& c, const std::string& t) { c.header.text = t; };
@@ -77,6 +78,12 @@ const auto kYTitle = [](ChartControl& c, const std::string& t) { c.chartArea.y.t
 const auto kPointLabel = [](ChartControl& c, const std::string& t) { c.group1.pointLabels[1] = t; };
 const auto kSeriesLabel = [](ChartControl& c, const std::string& t) { c.group1.seriesLabels[2] = t; };
 const auto kValueLabel = [](ChartControl& c, const std::string& t) { samples::addValueLabel(c, 2, 3, t); };
+// A pie whose legend names the slices after the point labels.
+const auto kPieSlice = [](ChartControl& c, const std::string& t) {
+    samples::fillPie(c, {5, 3, 8});
+    c.group1.seriesLabels.clear();
+    c.group1.pointLabels = {"Booked", t, "Done"};
+};
 
 INSTANTIATE_TEST_SUITE_P(Texts, SvgTextTest,
                          ::testing::Values(TextCase{"header", kHeader, "Qty of Bookings: Total = 1234"},
@@ -90,45 +97,9 @@ INSTANTIATE_TEST_SUITE_P(Texts, SvgTextTest,
                                            TextCase{"valueLabelLeadingBlank", kValueLabel, " 12.5"},
                                            TextCase{"valueLabelNegative", kValueLabel, "-3"},
                                            TextCase{"valueLabelMarkup", kValueLabel, "<a&b>"},
-                                           TextCase{"nonAscii", kHeader, "Buchungen \u00fcber \u20ac 500"}),
-                         [](const auto& info) { return std::string(info.param.name); });
-
-TEST(SvgExportTest, DocumentTitleIsTheEscapedHeader)
-{
-    ChartControl chart;
-    samples::styleLikeTheChartObject(chart, "Sales < Costs & more");
-    samples::fillTable(chart, 2, 3, kBar);
-    const SvgContent svg = exportSvg(chart);
-    ASSERT_TRUE(svg.error.isEmpty()) << svg.error.toStdString();
-    EXPECT_EQ(svg.title.toStdString(), "Sales < Costs & more");
-}
-
-TEST(SvgExportTest, PieLegendShowsTheSliceCaptions)
-{
-    ChartControl chart;
-    samples::styleLikeTheChartObject(chart, "Jobs by status");
-    samples::fillPie(chart, {5, 3, 8});
-    chart.group1.pointLabels = {"Booked", "Quoted", "Done"};
-    const SvgContent svg = exportSvg(chart);
-    ASSERT_TRUE(svg.error.isEmpty());
-    for (const char* caption : {"Booked", "Quoted", "Done"})
-        EXPECT_TRUE(svg.texts.contains(QLatin1String(caption))) << caption;
-}
-
-TEST(SvgExportTest, XAxisShowsPointNumbersUnlessAnnotatedWithLabels)
-{
-    ChartControl chart;
-    samples::styleLikeTheChartObject(chart);
-    samples::fillTable(chart, 2, 4, kBar);
-    samples::addPointLabels(chart, 4, "Week ");
-    chart.chartArea.x.annotationMethod = 1;
-    const SvgContent numbers = exportSvg(chart);
-    EXPECT_TRUE(numbers.texts.contains(QLatin1String("3")));
-    EXPECT_FALSE(numbers.texts.contains(QLatin1String("Week 3")));
-    chart.chartArea.x.annotationMethod = 2;
-    const SvgContent labels = exportSvg(chart);
-    EXPECT_TRUE(labels.texts.contains(QLatin1String("Week 3")));
-}
+                                           TextCase{"nonAscii", kHeader, "Buchungen \u00fcber \u20ac 500"},
+                                           TextCase{"pieSliceCaptionInLegend", kPieSlice, "Quoted"}),
+                         samples::rowName);
 
 // Labels that would cover a label already drawn are left out; the first one stays.
 struct OverlapCase {
@@ -157,7 +128,7 @@ INSTANTIATE_TEST_SUITE_P(Labels, ValueLabelOverlapTest,
                          ::testing::Values(OverlapCase{"samePlace", 2, 1, false}, OverlapCase{"farAway", 2, 6, true},
                                            OverlapCase{"noSuchPoint", 2, 9, false},
                                            OverlapCase{"noSuchSeries", 5, 1, false}),
-                         [](const auto& info) { return std::string(info.param.name); });
+                         samples::rowName);
 
 }  // namespace
 }  // namespace kg::control

@@ -17,6 +17,17 @@
 namespace kg::control::test {
 
 inline const QSize kViewSize(1000, 700);
+using samples::rowName;
+
+// A drag with the given buttons pressed in order (and let go in reverse order).
+inline void dragOn(QWidget* w, const std::vector<Qt::MouseButton>& buttons, Qt::KeyboardModifiers m, QPoint from,
+                   QPoint to)
+{
+    for (Qt::MouseButton b : buttons) QTest::mousePress(w, b, m, from);
+    QTest::mouseMove(w, (from + to) / 2);
+    QTest::mouseMove(w, to);
+    for (auto it = std::rbegin(buttons); it != std::rend(buttons); ++it) QTest::mouseRelease(w, *it, {}, to);
+}
 
 // The three series of the view tests: values that differ from bar to bar, one with a decimal.
 inline void fillMonthlyBars(ChartControl& c, int16_t chartType)
@@ -61,13 +72,9 @@ struct ViewFixture : ::testing::Test {
         QApplication::sendEvent(view.get(), &e);
     }
 
-    // A drag with the given buttons pressed in order (and let go in reverse order).
     void drag(const std::vector<Qt::MouseButton>& buttons, Qt::KeyboardModifiers m, QPoint from, QPoint to)
     {
-        for (Qt::MouseButton b : buttons) press(b, m, from);
-        moveTo((from + to) / 2);
-        moveTo(to);
-        for (auto it = std::rbegin(buttons); it != std::rend(buttons); ++it) release(*it, to);
+        dragOn(view.get(), buttons, m, from, to);
     }
 };
 

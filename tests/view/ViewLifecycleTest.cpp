@@ -1,26 +1,22 @@
 // The view state belongs to the window's control: a redraw of the same chart (value labels on or
 // off, the style dialog's redraw) keeps scale, move and zoom; a new request starts plain. The
 // chart object reads a rotation made with the mouse back from the control.
-#include <QtTest/QTest>
 #include <functional>
-#include <ostream>
 
-#include "chart/control/render/ChartLayout.h"
-#include "chart/control/view/ChartView.h"
 #include "support/RequestFixture.h"
+#include "view/ViewFixture.h"
 
 namespace kg::test {
 namespace {
 
 constexpr DispId kHourly1 = 0x60030014;
+using control::test::dragOn;
 
 struct AfterCase {
     const char* name;
     std::function<void(RequestFixture&)> then;
     bool keepsView;
 };
-
-std::ostream& operator<<(std::ostream& os, const AfterCase& c) { return os << c.name; }
 
 class ViewLifecycleTest : public RequestFixture, public ::testing::WithParamInterface<AfterCase> {
 protected:
@@ -29,12 +25,6 @@ protected:
         setForm("{\"grid1\": " + gridJson(1, 3, 8) + "}");
         Args args{Variant(int32_t(3)), Variant(100.0)};
         ASSERT_EQ(request(kHourly1, args), 0) << lastError;
-    }
-    void drag(Qt::MouseButton b, Qt::KeyboardModifiers m, QPoint from, QPoint to)
-    {
-        QTest::mousePress(view.get(), b, m, from);
-        QTest::mouseMove(view.get(), to);
-        QTest::mouseRelease(view.get(), b, {}, to);
     }
     void TearDown() override
     {
@@ -54,10 +44,10 @@ TEST_P(ViewLifecycleTest, RedrawKeepsTheViewANewRequestResetsIt)
     const control::ChartLayout l = control::computeLayout(c, QRectF(view->rect()));
     const QPoint centre = l.chartContent.center().toPoint();
 
-    drag(Qt::MiddleButton, Qt::NoModifier, centre, centre + QPoint(10, 20));  // rotate
-    drag(Qt::LeftButton, Qt::ShiftModifier, l.toScreen(2, 15).toPoint(), l.toScreen(6, 30).toPoint());
-    drag(Qt::MiddleButton, Qt::ControlModifier, centre, centre + QPoint(0, 60));
-    drag(Qt::MiddleButton, Qt::ShiftModifier, centre, centre + QPoint(-40, 25));
+    dragOn(view.get(), {Qt::MiddleButton}, Qt::NoModifier, centre, centre + QPoint(10, 20));  // rotate
+    dragOn(view.get(), {Qt::LeftButton}, Qt::ShiftModifier, l.toScreen(2, 15).toPoint(), l.toScreen(6, 30).toPoint());
+    dragOn(view.get(), {Qt::MiddleButton}, Qt::ControlModifier, centre, centre + QPoint(0, 60));
+    dragOn(view.get(), {Qt::MiddleButton}, Qt::ShiftModifier, centre, centre + QPoint(-40, 25));
     ASSERT_EQ(c.chartArea.view3D.rotation, 15);
     ASSERT_EQ(c.chartArea.view3D.elevation, 20);
     EXPECT_EQ(modMain::chart().Rotation(), 15);
@@ -108,7 +98,7 @@ INSTANTIATE_TEST_SUITE_P(
                                     ASSERT_EQ(f.request(kHourly1, args), 0) << f.lastError;
                                 },
                                 false}),
-    [](const auto& info) { return std::string(info.param.name); });
+    control::samples::rowName);
 
 }  // namespace
 }  // namespace kg::test

@@ -4,7 +4,6 @@
 #include <QToolTip>
 #include <cmath>
 #include <functional>
-#include <ostream>
 
 #include "view/ViewFixture.h"
 
@@ -51,25 +50,15 @@ Aim sliceMiddle(int32_t series)
 }
 
 // The 3-D pie's rim straight below the centre (270 degrees).
-Aim rimBottom()
-{
-    return [](const ChartControl&, const ChartLayout& l) {
-        return l.view.map(l.pie.centre + QPointF(0, l.pie.ry + l.pie.rim / 2));
-    };
-}
+const Aim kRimBottom = [](const ChartControl&, const ChartLayout& l) {
+    return l.view.map(l.pie.centre + QPointF(0, l.pie.ry + l.pie.rim / 2));
+};
 
-Aim plotCorner()
-{
-    return [](const ChartControl&, const ChartLayout& l) { return l.view.map(l.plotArea.topLeft() + QPointF(3, 3)); };
-}
-Aim legend()
-{
-    return [](const ChartControl&, const ChartLayout& l) { return l.legend.center(); };
-}
-Aim header()
-{
-    return [](const ChartControl&, const ChartLayout& l) { return l.header.center(); };
-}
+const Aim kPlotCorner = [](const ChartControl&, const ChartLayout& l) {
+    return l.view.map(l.plotArea.topLeft() + QPointF(3, 3));
+};
+const Aim kLegend = [](const ChartControl&, const ChartLayout& l) { return l.legend.center(); };
+const Aim kHeader = [](const ChartControl&, const ChartLayout& l) { return l.header.center(); };
 
 enum class Labels { Monthly, None, PieByPoints, PieByPointsNoSeries, PieBySeries };
 
@@ -81,9 +70,8 @@ struct TipCase {
     ViewState view;
     Aim aim;
     const char* tip;
+    std::function<void(ChartControl&)> tweak = nullptr;
 };
-
-std::ostream& operator<<(std::ostream& os, const TipCase& c) { return os << c.name; }
 
 void fillFor(ChartControl& c, const TipCase& t)
 {
@@ -103,6 +91,7 @@ void fillFor(ChartControl& c, const TipCase& t)
     }
     c.chartArea.view3D = {10, 10, t.depth};
     c.view = t.view;
+    if (t.tweak) t.tweak(c);
 }
 
 class ToolTipTest : public ViewFixture, public ::testing::WithParamInterface<TipCase> {};
@@ -135,33 +124,16 @@ INSTANTIATE_TEST_SUITE_P(
         TipCase{"pieByPointLabels", kPie, 0, Labels::PieByPoints, {}, sliceMiddle(2), "Jobs, Closed:  30"},
         TipCase{"pieWithoutSeriesLabel", kPie, 0, Labels::PieByPointsNoSeries, {}, sliceMiddle(3), "Held:  20"},
         TipCase{"pieBySeriesLabels", kPie, 0, Labels::PieBySeries, {}, sliceMiddle(1), "Status 1:  10"},
-        TipCase{"pie3DRim", kPie, 10, Labels::PieByPoints, {}, rimBottom(), "Jobs, Closed:  30"},
+        TipCase{"pie3DRim", kPie, 10, Labels::PieByPoints, {}, kRimBottom, "Jobs, Closed:  30"},
         TipCase{"pieZoomed", kPie, 10, Labels::PieByPoints, kZoomed, sliceMiddle(3), "Jobs, Held:  20"},
-        TipCase{"plotBackground", kBar, 0, Labels::Monthly, {}, plotCorner(), ""},
-        TipCase{"legend", kBar, 0, Labels::Monthly, {}, legend(), ""},
-        TipCase{"header", kBar, 0, Labels::Monthly, {}, header(), ""}),
-    [](const auto& info) { return std::string(info.param.name); });
-
-TEST_F(ViewFixture, NegativeValueKeepsItsSign)
-{
-    fillMonthlyBars(*chart, kBar);
-    chart->data().setY(1, 2, -4.25);
-    makeView();
-    EXPECT_EQ(view->toolTipAt(barFront(1, 2)(*chart, layout())).toStdString(), "Series 1, Feb: -4.25");
-}
-
-// A bar moved out of the chart area by the view is hidden, and so is its tip.
-TEST_F(ViewFixture, DataMovedOutOfTheChartAreaHasNoTip)
-{
-    fillMonthlyBars(*chart, kBar);
-    chart->view = {1.0, 0.9, 0};
-    makeView();
-    const ChartLayout l = layout();
-    const QPointF at = l.view.map(l.barRect(*chart, 3, 1).center());
-    ASSERT_FALSE(l.chartContent.contains(at));
-    ASSERT_TRUE(QRectF(view->rect()).contains(at));
-    EXPECT_TRUE(view->toolTipAt(at).isEmpty());
-}
+        TipCase{"negativeKeepsItsSign", kBar, 10, Labels::Monthly, {}, barFront(1, 2), "Series 1, Feb: -4.25",
+                [](ChartControl& c) { c.data().setY(1, 2, -4.25); }},
+        // A bar moved out of the chart area by the view is hidden, and so is its tip.
+        TipCase{"barMovedOutOfTheArea", kBar, 10, Labels::Monthly, {1.0, 0.9, 0}, barFront(3, 1), ""},
+        TipCase{"plotBackground", kBar, 0, Labels::Monthly, {}, kPlotCorner, ""},
+        TipCase{"legend", kBar, 0, Labels::Monthly, {}, kLegend, ""},
+        TipCase{"header", kBar, 0, Labels::Monthly, {}, kHeader, ""}),
+    rowName);
 
 TEST_F(ViewFixture, PositionThatIsNoNumberHasNoTip)
 {
