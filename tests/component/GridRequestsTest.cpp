@@ -18,6 +18,9 @@ std::string formWithAllGrids(int fixedRows, int dataRows, int cols)
     return "{\"grid1\": " + g + ", \"grid2\": " + g + ", \"grid3\": " + g + "}";
 }
 
+// The request's two arguments: the series count and the total for the header.
+Args seriesAndTotal(int32_t series, Variant total = Variant(1.0)) { return {Variant(series), std::move(total)}; }
+
 struct HeaderCase {
     const char* name;
     DispId id;
@@ -33,8 +36,7 @@ TEST_P(Headers, TotalIsWrittenByTheRequestsRule)
 {
     const HeaderCase& c = GetParam();
     setForm(formWithAllGrids(1, 2, 14));
-    Args args{Variant(int32_t(2)), c.total};
-    ASSERT_EQ(request(c.id, args), 0) << lastError;
+    ASSERT_EQ(request(c.id, seriesAndTotal(2, c.total)), 0) << lastError;
     EXPECT_EQ(modMain::goChart->ChartHeader(), c.header);
     EXPECT_EQ(chart1().header.text, c.header);
     EXPECT_EQ(modMain::giChartKind, c.chartKind);
@@ -48,7 +50,6 @@ TEST_P(Headers, TotalIsWrittenByTheRequestsRule)
 INSTANTIATE_TEST_SUITE_P(
     Table, Headers,
     ::testing::Values(
-        HeaderCase{"hourly1Zero", kHourly1, Variant(0.0), "Qty of Bookings: Total =  0", 5, "Quantity"},
         HeaderCase{"hourly1Negative", kHourly1, Variant(-3.5), "Qty of Bookings: Total = -3.5", 5, "Quantity"},
         HeaderCase{"hourly1Text", kHourly1, Variant("1234.5"), "Qty of Bookings: Total =  1234.5", 5, "Quantity"},
         HeaderCase{"hourly2Zero", kHourly2, Variant(0.0), "Value of Bookings: Total = $0.00", 5, "Value"},
@@ -66,7 +67,7 @@ INSTANTIATE_TEST_SUITE_P(
 TEST_F(Fixture, HourlyFillsTableAndLabelsFromTheGrid)
 {
     setForm(formWithAllGrids(1, 3, 14));
-    Args args{Variant(int32_t(3)), Variant(1.0)};
+    Args args = seriesAndTotal(3);
     ASSERT_EQ(request(kHourly1, args), 0) << lastError;
     control::ChartControl& c = chart1();
     EXPECT_EQ(c.group1.seriesLabels, (std::vector<std::string>{"Row 1", "Row 2", "Row 3"}));
@@ -89,11 +90,10 @@ TEST_F(Fixture, HourlyFillsTableAndLabelsFromTheGrid)
 TEST_F(Fixture, PropAndYearlyLeaveTheSameChart)
 {
     setForm(formWithAllGrids(1, 2, 16));
-    Args args{Variant(int32_t(2)), Variant(5.0)};
-    ASSERT_EQ(request(kProp1, args), 0) << lastError;
+    ASSERT_EQ(request(kProp1, seriesAndTotal(2)), 0) << lastError;
     const auto labels = chart1().group1.pointLabels;
     const double last = chart1().data().y(2, 12);
-    ASSERT_EQ(request(kYearly1, args), 0) << lastError;
+    ASSERT_EQ(request(kYearly1, seriesAndTotal(2)), 0) << lastError;
     EXPECT_EQ(chart1().group1.pointLabels, labels);
     EXPECT_EQ(labels.size(), 12u);  // twelve months whatever the column count
     EXPECT_EQ(chart1().data().y(2, 12), last);
@@ -103,41 +103,73 @@ TEST_F(Fixture, PropAndYearlyLeaveTheSameChart)
 TEST_F(Fixture, SeveralFixedRowsKeepCaptionsWithTheirValues)
 {
     setForm(formWithAllGrids(2, 2, 14));
-    Args args{Variant(int32_t(2)), Variant(1.0)};
-    ASSERT_EQ(request(kHourly1, args), 0) << lastError;
+    ASSERT_EQ(request(kHourly1, seriesAndTotal(2)), 0) << lastError;
     EXPECT_EQ(chart1().group1.seriesLabels, (std::vector<std::string>{"Row 1", "Row 2"}));
     EXPECT_EQ(chart1().data().y(1, 1), 11);  // "Row 1" values in series 1
     EXPECT_EQ(chart1().data().y(2, 1), 21);
 }
 
-struct SeriesCountCase {
+// How a request ends for its form and arguments: the error number, a word its description must
+// name, the chart kind stored before it failed (-1: not checked), and whether the chart was
+// loaded before the form was needed. The mouse pointer is back to default whatever happened.
+struct OutcomeCase {
     const char* name;
-    int32_t lNumSeries;
+    std::string form;  // empty: no source form set
+    DispId id;
+    Args args;
     int32_t error;
+    const char* detail = "";
+    int16_t kind = -1;
+    bool loadedFirst = false;
 };
 
-class SeriesCounts : public Fixture, public ::testing::WithParamInterface<SeriesCountCase> {};
+void PrintTo(const OutcomeCase& c, std::ostream* os) { *os << c.name; }
 
-TEST_P(SeriesCounts, AgainstThreeDataRows)
+class Outcomes : public Fixture, public ::testing::WithParamInterface<OutcomeCase> {};
+
+TEST_P(Outcomes, EndAsTheArgumentsAndFormDecide)
 {
-    setForm(formWithAllGrids(1, 3, 14));
-    Args args{Variant(GetParam().lNumSeries), Variant(1.0)};
-    EXPECT_EQ(request(kProp1, args), GetParam().error) << lastError;
-    EXPECT_EQ(ui->mousePointer(), kPointerDefault);  // restored even after a failure
+    const OutcomeCase& c = GetParam();
+    if (!c.form.empty()) setForm(c.form);
+    EXPECT_EQ(request(c.id, c.args), c.error) << lastError;
+    EXPECT_NE(lastError.find(c.detail), std::string::npos) << lastError;
+    if (c.kind >= 0) {
+        EXPECT_EQ(modMain::giChartKind, c.kind);
+    }
+    if (c.loadedFirst) {
+        EXPECT_TRUE(modMain::goChart && modMain::gfChart);
+    }
+    EXPECT_EQ(ui->mousePointer(), kPointerDefault);
 }
 
-INSTANTIATE_TEST_SUITE_P(Table, SeriesCounts,
-                         ::testing::Values(SeriesCountCase{"fewer", 2, errc::SubscriptOutOfRange},
-                                           SeriesCountCase{"equal", 3, 0}, SeriesCountCase{"more", 5, 0},
-                                           SeriesCountCase{"negative", -1, errc::InvalidProcedureCall},
-                                           SeriesCountCase{"huge", INT32_MAX, errc::InvalidProcedureCall}),
-                         [](const auto& info) { return std::string(info.param.name); });
+const std::string kThreeRows = formWithAllGrids(1, 3, 14);
+const std::string kGrid2Only = "{\"grid2\": " + test::gridJson(1, 2, 14) + "}";
+const std::string kOneColumn = "{\"grid1\": " + test::gridJson(1, 2, 1) + "}";
+
+INSTANTIATE_TEST_SUITE_P(
+    Table, Outcomes,
+    ::testing::Values(
+        // The series count against three data rows.
+        OutcomeCase{"fewerSeriesThanRows", kThreeRows, kProp1, seriesAndTotal(2), errc::SubscriptOutOfRange},
+        OutcomeCase{"seriesEqualToRows", kThreeRows, kProp1, seriesAndTotal(3), 0},
+        OutcomeCase{"negativeSeries", kThreeRows, kProp1, seriesAndTotal(-1), errc::InvalidProcedureCall},
+        OutcomeCase{"hugeSeries", kThreeRows, kProp1, seriesAndTotal(INT32_MAX), errc::InvalidProcedureCall},
+        // Bad totals fail after the chart kind is stored.
+        OutcomeCase{"totalText", kThreeRows, kHourly1, seriesAndTotal(2, Variant("abc")), errc::TypeMismatch, "", 5},
+        OutcomeCase{"totalNull", kThreeRows, kProp2, seriesAndTotal(2, Variant::null()), errc::InvalidUseOfNull, "", 4},
+        OutcomeCase{"noSourceForm", "", kHourly1, seriesAndTotal(2), errc::ObjectNotSet, "", -1, true},
+        OutcomeCase{"gridMissing", kGrid2Only, kHourly1, seriesAndTotal(2), errc::MemberNotFound, "grid1"},
+        OutcomeCase{"oneColumnGrid", kOneColumn, kHourly1, seriesAndTotal(2), errc::SubscriptOutOfRange},
+        OutcomeCase{"oneArgument", kThreeRows, kHourly1, {Variant(int32_t(2))}, errc::WrongArgumentCount},
+        OutcomeCase{"seriesNotANumber", kThreeRows, kHourly1, {Variant("x"), Variant(1.0)}, errc::TypeMismatch},
+        OutcomeCase{"seriesOverflow", kThreeRows, kHourly1, {Variant(1e12), Variant(1.0)}, errc::Overflow},
+        OutcomeCase{"unknownDispatchId", kThreeRows, 0x12345678, {}, errc::MemberNotFound}),
+    [](const auto& info) { return std::string(info.param.name); });
 
 TEST_F(Fixture, ExtraSeriesDrawAsZero)
 {
     setForm(formWithAllGrids(1, 1, 14));
-    Args args{Variant(int32_t(3)), Variant(1.0)};
-    ASSERT_EQ(request(kYearly2, args), 0) << lastError;
+    ASSERT_EQ(request(kYearly2, seriesAndTotal(3)), 0) << lastError;
     EXPECT_EQ(chart1().data().seriesCount(), 3);
     EXPECT_EQ(chart1().data().y(3, 4), 0);
     EXPECT_EQ(modMain::gvArray.at(3, 4).type(), VarType::Integer);
@@ -147,10 +179,8 @@ TEST_F(Fixture, NoDataShowsTheMessageAndChangesNothing)
 {
     setForm("{\"grid1\": " + test::gridJson(1, 0, 14) + ", \"grid2\": " + test::gridJson(1, 2, 14) + "}");
     modMain::giChartKind = 4;
-    Args args{Variant(int32_t(2)), Variant(1.0)};
-    EXPECT_EQ(request(kHourly1, args), 0);  // caption rows only
-    Args empty{Variant(int32_t(2)), Variant()};
-    EXPECT_EQ(request(kHourly2, empty), 0);  // Empty total with a full grid
+    EXPECT_EQ(request(kHourly1, seriesAndTotal(2)), 0);  // caption rows only
+    EXPECT_EQ(request(kHourly2, seriesAndTotal(2, Variant())), 0);  // Empty total with a full grid
     EXPECT_EQ(ui->messages, (std::vector<std::string>{"There is no data to work with",
                                                       "There is no data to work with"}));
     EXPECT_EQ(modMain::giChartKind, 4);
@@ -161,52 +191,18 @@ TEST_F(Fixture, NoDataShowsTheMessageAndChangesNothing)
 TEST_F(Fixture, TwoColumnGridHasNoPoints)
 {
     setForm("{\"grid1\": " + test::gridJson(1, 2, 2) + "}");
-    Args args{Variant(int32_t(2)), Variant(1.0)};
-    ASSERT_EQ(request(kHourly1, args), 0) << lastError;
+    ASSERT_EQ(request(kHourly1, seriesAndTotal(2)), 0) << lastError;
     EXPECT_EQ(modMain::goChart->NumPoints(), 0);
     EXPECT_TRUE(chart1().group1.pointLabels.empty());
-
-    setForm("{\"grid1\": " + test::gridJson(1, 2, 1) + "}");
-    EXPECT_EQ(request(kHourly1, args), errc::SubscriptOutOfRange);
-}
-
-TEST_F(Fixture, BadTotalsFailAfterTheCodeIsStored)
-{
-    setForm(formWithAllGrids(1, 2, 14));
-    Args text{Variant(int32_t(2)), Variant("abc")};
-    EXPECT_EQ(request(kHourly1, text), errc::TypeMismatch);
-    EXPECT_EQ(modMain::giChartKind, 5);
-    EXPECT_EQ(ui->mousePointer(), kPointerDefault);
-    Args null{Variant(int32_t(2)), Variant::null()};
-    EXPECT_EQ(request(kProp2, null), errc::InvalidUseOfNull);
-    EXPECT_EQ(modMain::giChartKind, 4);
-}
-
-TEST_F(Fixture, RequestBeforeSourceFormFailsAfterGraphInitialize)
-{
-    Args args{Variant(int32_t(2)), Variant(1.0)};
-    EXPECT_EQ(request(kHourly1, args), errc::ObjectNotSet);
-    EXPECT_TRUE(modMain::goChart);
-    EXPECT_TRUE(modMain::gfChart);
-}
-
-TEST_F(Fixture, MissingGridIsMemberNotFound)
-{
-    setForm("{\"grid2\": " + test::gridJson(1, 2, 14) + "}");
-    Args args{Variant(int32_t(2)), Variant(1.0)};
-    EXPECT_EQ(request(kHourly1, args), errc::MemberNotFound);
-    EXPECT_NE(lastError.find("grid1"), std::string::npos);
 }
 
 TEST_F(Fixture, TwoRequestsInARowReplaceEverything)
 {
     setForm("{\"grid1\": " + test::gridJson(1, 3, 14) + ", \"grid2\": " + test::gridJson(1, 1, 14) + "}");
-    Args first{Variant(int32_t(3)), Variant(1.0)};
-    ASSERT_EQ(request(kHourly1, first), 0);
+    ASSERT_EQ(request(kHourly1, seriesAndTotal(3)), 0);
     const Ref<c2dChart> firstChart = modMain::goChart;
     const Ref<ChartWindowPort> window = modMain::gfChart;
-    Args second{Variant(int32_t(1)), Variant(2.0)};
-    ASSERT_EQ(request(kHourly2, second), 0);
+    ASSERT_EQ(request(kHourly2, seriesAndTotal(1, Variant(2.0))), 0);
     EXPECT_NE(modMain::goChart, firstChart);   // a fresh chart object
     EXPECT_EQ(modMain::gfChart, window);        // the same window
     EXPECT_EQ(chart1().group1.seriesLabels, std::vector<std::string>{"Row 1"});
@@ -220,21 +216,10 @@ TEST_F(Fixture, StoredStyleAppliesToTheRequest)
     writeSetting("View3D", " 0");
     writeSetting("LabelsOnDefault", "1");
     setForm(formWithAllGrids(1, 2, 14));
-    Args args{Variant(int32_t(2)), Variant(1.0)};
-    ASSERT_EQ(request(kProp1, args), 0) << lastError;
+    ASSERT_EQ(request(kProp1, seriesAndTotal(2)), 0) << lastError;
     EXPECT_EQ(chart1().group1.chartType, control::kPlot);
     EXPECT_EQ(chart1().chartArea.view3D.depth, 0);
     EXPECT_EQ(chart1().chartLabels.size(), 24u);
-}
-
-TEST_F(Fixture, WrongArgumentsAreRefusedClearly)
-{
-    setForm(formWithAllGrids(1, 2, 14));
-    EXPECT_EQ(request(kHourly1, {Variant(int32_t(2))}), errc::WrongArgumentCount);
-    EXPECT_EQ(request(kHourly1, {Variant("x"), Variant(1.0)}), errc::TypeMismatch);
-    EXPECT_EQ(request(kHourly1, {Variant(1e12), Variant(1.0)}), errc::Overflow);
-    EXPECT_EQ(request(0x12345678), errc::MemberNotFound);
-    EXPECT_EQ(ui->mousePointer(), kPointerDefault);
 }
 
 }  // namespace

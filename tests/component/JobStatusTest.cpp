@@ -140,7 +140,9 @@ TEST_P(FieldLists, EveryCategoryHasAPoint)
     EXPECT_EQ(chart1().group1.pointLabels.size(), size_t(GetParam().captions));
     EXPECT_EQ(count(13), 1);  // "Imported" counts even beyond the list
     EXPECT_EQ(count(1), 1);
-    if (GetParam().points > 13) EXPECT_EQ(count(GetParam().points), 0);
+    if (GetParam().points > 13) {
+        EXPECT_EQ(count(GetParam().points), 0);
+    }
 }
 
 INSTANTIATE_TEST_SUITE_P(Table, FieldLists,

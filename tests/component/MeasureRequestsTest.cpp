@@ -51,7 +51,9 @@ TEST_P(Choices, DrawTheChosenMeasure)
     EXPECT_EQ(chart.chartArea.y.title, c.yTitle);
     EXPECT_EQ(chart.chartArea.x.title, "01/07/2013 - 30/06/2014");
     EXPECT_EQ(chart.group1.pointLabels, (std::vector<std::string>{"Retail", "Corporate", "Online"}));
-    if (!c.seriesLabels.empty()) EXPECT_EQ(chart.group1.seriesLabels, c.seriesLabels);
+    if (!c.seriesLabels.empty()) {
+        EXPECT_EQ(chart.group1.seriesLabels, c.seriesLabels);
+    }
     EXPECT_EQ(chart.legend.isShown, c.series.size() == 2);
     EXPECT_TRUE(modMain::gfChart->isRedrawVisible());
     EXPECT_EQ(modMain::giChartKind, c.request == kBookings ? 1 : 2);

@@ -84,7 +84,9 @@ TEST_P(RequestFamilyTest, DrawsItsChartAndSaysSo)
         chooser.emplace([&] { return visibleTopLevel(c.dialog); },
                         [](QWidget* dialog) { clickIn(dialog, {"optData_2", "Command1"}); });
     click(c.request);
-    if (chooser) EXPECT_TRUE(chooser->done()) << c.dialog << " was not shown";
+    if (chooser) {
+        EXPECT_TRUE(chooser->done()) << c.dialog << " was not shown";
+    }
     EXPECT_EQ(statusText(), std::string("Drew ") + c.caption);
     QWidget* chart = visibleTopLevel("frmChart");
     EXPECT_NE(chart, nullptr) << "no chart window shown";

@@ -108,7 +108,7 @@ Reached follow(KGObject* form, const std::vector<Step>& path)
 
 void PrintTo(const PathCase& c, std::ostream* os) { *os << c.name; }
 
-class FormObjectsTest : public ::testing::TestWithParam<PathCase> {
+class FormFixture : public ::testing::Test {
 protected:
     void SetUp() override
     {
@@ -121,18 +121,26 @@ protected:
     KGObject* form = nullptr;
 };
 
+class FormObjectsTest : public FormFixture, public ::testing::WithParamInterface<PathCase> {};
+
 TEST_P(FormObjectsTest, AnswersAsTheHostsControlsDo)
 {
     const PathCase& c = GetParam();
     Reached r = follow(form, c.path);
     const Expected& e = c.expected;
     EXPECT_EQ(r.status, e.status);
-    if (e.status == KG_E_EXCEPTION) EXPECT_EQ(r.error.number, e.errorNumber) << r.error.description;
+    if (e.status == KG_E_EXCEPTION) {
+        EXPECT_EQ(r.error.number, e.errorNumber) << r.error.description;
+    }
     if (KG_SUCCEEDED(e.status)) {
         EXPECT_EQ(r.value.vt, e.vt);
-        if (auto* n = std::get_if<int32_t>(&e.value)) EXPECT_EQ(r.value.lVal, *n);
-        if (auto* d = std::get_if<double>(&e.value)) EXPECT_DOUBLE_EQ(r.value.dblVal, *d);
-        if (auto* s = std::get_if<const char*>(&e.value)) EXPECT_STREQ(r.value.strVal, *s);
+        if (auto* n = std::get_if<int32_t>(&e.value)) {
+            EXPECT_EQ(r.value.lVal, *n);
+        } else if (auto* d = std::get_if<double>(&e.value)) {
+            EXPECT_DOUBLE_EQ(r.value.dblVal, *d);
+        } else if (auto* s = std::get_if<const char*>(&e.value)) {
+            EXPECT_STREQ(r.value.strVal, *s);
+        }
     }
     api().VariantClear(&r.value);
 }
@@ -144,13 +152,10 @@ Expected raised(int32_t number) { return {KG_E_EXCEPTION, KG_VT_EMPTY, {}, numbe
 Expected status(int32_t s) { return {s, KG_VT_EMPTY, {}, 0}; }
 
 const PathCase kPaths[] = {
-    {"GridIsAnObject", {{"grid1", {}}}, {KG_S_OK, KG_VT_OBJECT, {}, 0}},
     {"NamesIgnoreCase", {{"GRID1", {}}, {"ROWS", {}}}, longValue(3)},
     {"FixedRows", {{"grid1", {}}, {"FixedRows", {}}}, longValue(1)},
     {"FixedRowsAsTheFormFileSays", {{"gridsettings1", {}}, {"fixedrows", {}}}, longValue(2)},
     {"Cols", {{"grid1", {}}, {"cols", {}}}, longValue(4)},
-    {"CaptionCell", {{"grid1", {}}, {"textmatrix", {0, 2}}}, text("Feb")},
-    {"RowCaption", {{"grid1", {}}, {"TextMatrix", {2, 0}}}, text("B")},
     {"HalfIndexGoesToEven", {{"grid1", {}}, {"textmatrix", {0.5, 1.5}}}, text("Feb")},
     {"IndexAsText", {{"grid1", {}}, {"textmatrix", {"1", "1"}}}, text("12")},
     {"EmptyCellText", {{"grid1", {}}, {"textmatrix", {1, 2}}}, text("")},
@@ -196,17 +201,13 @@ TEST(FormObjectLifetimeTest, AGridWhoseTableIsGoneRaisesObjectUnloaded)
     api().Release(form);
 }
 
-TEST(FormObjectLifetimeTest, WritesAreNotMembers)
+TEST_F(FormFixture, WritesAreNotMembers)
 {
-    kg::demo::ReportForm screen;
-    screen.fill(sampleReport());
-    KGObject* form = kg::demo::makeSourceForm(api(), &screen);
     int32_t id = 0;
     ASSERT_EQ(form->vtbl->GetIDOfName(form, "grid1", &id), KG_S_OK);
     KGVariant arg;
     api().VariantInit(&arg);
     EXPECT_EQ(form->vtbl->Invoke(form, id, KG_DISPATCH_PROPERTYPUT, &arg, 1, nullptr, nullptr), KG_E_MEMBERNOTFOUND);
-    api().Release(form);
 }
 
 }  // namespace
