@@ -204,7 +204,8 @@ TEST(FormFile, MissingFileOrFolderIsRefusedNamingThePath)
     const std::pair<std::string, int32_t> cases[] = {{dir.filePath("nothing.json").toStdString(), errc::FileNotFound},
                                                      {dir.path().toStdString(), errc::PathFileAccess}};
     for (const auto& [path, number] : cases) {
-        const Error e = test::errorOf([&] { loadFormFile(path); });
+        const std::string& file = path;  // a structured binding cannot be captured in C++17
+        const Error e = test::errorOf([&] { loadFormFile(file); });
         EXPECT_EQ(e.number(), number) << path;
         EXPECT_NE(e.description().find(path), std::string::npos) << e.description();
     }
