@@ -6,6 +6,7 @@
 
 #include <cstdint>
 #include <cstdio>
+#include <cctype>
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
@@ -46,6 +47,13 @@ inline std::vector<std::string> contentLines(const std::string& text)
     for (std::string line; std::getline(in, line);)
         if (line.find_first_not_of(" \t\r") != std::string::npos) lines.push_back(line);
     return lines;
+}
+
+// `s` with every letter put through `convert` (::toupper, ::tolower).
+inline std::string withCase(std::string s, int (*convert)(int))
+{
+    for (char& c : s) c = static_cast<char>(convert(static_cast<unsigned char>(c)));
+    return s;
 }
 
 inline std::string guidText(const KGGuid& g)

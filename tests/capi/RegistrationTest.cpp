@@ -19,13 +19,15 @@ std::string ourClassSection() { return "[CLSID\\" + guidText(KG_CLSID_cTavixGrap
 const std::string kOurProgIdSection = "[ProgID\\KarstGraph.cTavixGraph]";
 const std::string kOtherClsid = "{11111111-2222-3333-4444-555555555555}";
 
-// The file this test program loaded the component from.
-std::string loadedLibrary()
+// The file the code at `address` was loaded from.
+std::string libraryHolding(void* address)
 {
     Dl_info info{};
-    if (!dladdr(reinterpret_cast<void*>(&DllRegisterServer), &info) || !info.dli_fname) return {};
-    return info.dli_fname;
+    return dladdr(address, &info) && info.dli_fname ? info.dli_fname : "";
 }
+
+// The file this test program loaded the component from.
+std::string loadedLibrary() { return libraryHolding(reinterpret_cast<void*>(&DllRegisterServer)); }
 
 bool sameFile(const std::string& a, const std::string& b)
 {
@@ -147,12 +149,6 @@ TEST_P(UnregisterTest, RemovesOnlyOurEntries)
     EXPECT_EQ(contentLines(readText(registry)), *c.after);
 }
 
-std::string lowerCase(std::string s)
-{
-    for (char& ch : s) ch = static_cast<char>(std::tolower(static_cast<unsigned char>(ch)));
-    return s;
-}
-
 INSTANTIATE_TEST_SUITE_P(
     Cases, UnregisterTest,
     ::testing::Values(
@@ -162,7 +158,7 @@ INSTANTIATE_TEST_SUITE_P(
         UnregisterCase{"ProgIdOfAnotherClassStays",
                        kOurProgIdSection + "\nCLSID=" + kOtherClsid + "\n" + ourClassSection() + "\nProgID=X\n",
                        std::vector<std::string>{kOurProgIdSection, "CLSID=" + kOtherClsid}},
-        UnregisterCase{"IdsWrittenInLowerCase", lowerCase(oursText("/x/libkarstgraph.so")), std::vector<std::string>{}},
+        UnregisterCase{"IdsWrittenInLowerCase", withCase(oursText("/x/libkarstgraph.so"), ::tolower), std::vector<std::string>{}},
         UnregisterCase{"NoFile", std::nullopt, std::nullopt}),
     byName);
 
@@ -257,13 +253,6 @@ struct ProgIdCase {
     int32_t status;
 };
 
-std::string libcPath()
-{
-    Dl_info info{};
-    dladdr(reinterpret_cast<void*>(&::getpid), &info);
-    return info.dli_fname ? info.dli_fname : "";
-}
-
 std::string replaced(std::string text, const std::string& from, const std::string& to)
 {
     for (size_t at = text.find(from); at != std::string::npos; at = text.find(from, at + to.size()))
@@ -279,7 +268,7 @@ TEST_P(ProgIdTest, CreatesTheRegisteredClass)
     if (c.file == "register") {
         ASSERT_EQ(DllRegisterServer(), KG_S_OK) << lastErrorDescription();
     } else if (!c.file.empty()) {
-        writeRegistry(replaced(replaced(c.file, "{LIB}", loadedLibrary()), "{LIBC}", libcPath()));
+        writeRegistry(replaced(replaced(c.file, "{LIB}", loadedLibrary()), "{LIBC}", libraryHolding(reinterpret_cast<void*>(&::getpid))));
     }
     ObjectRef graph;
     const int32_t status = KGCreateInstanceByProgID(c.progId, graph.out());

@@ -34,9 +34,6 @@ size_t pointsOfSeries2(const ChartControl& c) { return size_t(c.data().pointCoun
 INSTANTIATE_TEST_SUITE_P(
     Table, ControlLimits,
     ::testing::Values(
-        LimitCase{"negativeSeries", [](ChartControl&) {},
-                  [](ChartControl& c) { c.data().setSeriesCount(-1); }, errc::InvalidProcedureCall,
-                  "series count -1", seriesCount},
         LimitCase{"seriesBeyondTheMost", [](ChartControl& c) { c.data().setSeriesCount(3); },
                   [](ChartControl& c) { c.data().setSeriesCount(ChartData::kMaxSeries + 1); },
                   errc::InvalidProcedureCall, "1048577", seriesCount},

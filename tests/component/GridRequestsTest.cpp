@@ -143,8 +143,6 @@ TEST_P(Outcomes, EndAsTheArgumentsAndFormDecide)
 }
 
 const std::string kThreeRows = formWithAllGrids(1, 3, 14);
-const std::string kGrid2Only = "{\"grid2\": " + test::gridJson(1, 2, 14) + "}";
-const std::string kOneColumn = "{\"grid1\": " + test::gridJson(1, 2, 1) + "}";
 
 INSTANTIATE_TEST_SUITE_P(
     Table, Outcomes,
@@ -152,18 +150,11 @@ INSTANTIATE_TEST_SUITE_P(
         // The series count against three data rows.
         OutcomeCase{"fewerSeriesThanRows", kThreeRows, kProp1, seriesAndTotal(2), errc::SubscriptOutOfRange},
         OutcomeCase{"seriesEqualToRows", kThreeRows, kProp1, seriesAndTotal(3), 0},
-        OutcomeCase{"negativeSeries", kThreeRows, kProp1, seriesAndTotal(-1), errc::InvalidProcedureCall},
-        OutcomeCase{"hugeSeries", kThreeRows, kProp1, seriesAndTotal(INT32_MAX), errc::InvalidProcedureCall},
         // Bad totals fail after the chart kind is stored.
         OutcomeCase{"totalText", kThreeRows, kHourly1, seriesAndTotal(2, Variant("abc")), errc::TypeMismatch, "", 5},
         OutcomeCase{"totalNull", kThreeRows, kProp2, seriesAndTotal(2, Variant::null()), errc::InvalidUseOfNull, "", 4},
         OutcomeCase{"noSourceForm", "", kHourly1, seriesAndTotal(2), errc::ObjectNotSet, "", -1, true},
-        OutcomeCase{"gridMissing", kGrid2Only, kHourly1, seriesAndTotal(2), errc::MemberNotFound, "grid1"},
-        OutcomeCase{"oneColumnGrid", kOneColumn, kHourly1, seriesAndTotal(2), errc::SubscriptOutOfRange},
-        OutcomeCase{"oneArgument", kThreeRows, kHourly1, {Variant(int32_t(2))}, errc::WrongArgumentCount},
-        OutcomeCase{"seriesNotANumber", kThreeRows, kHourly1, {Variant("x"), Variant(1.0)}, errc::TypeMismatch},
-        OutcomeCase{"seriesOverflow", kThreeRows, kHourly1, {Variant(1e12), Variant(1.0)}, errc::Overflow},
-        OutcomeCase{"unknownDispatchId", kThreeRows, 0x12345678, {}, errc::MemberNotFound}),
+        OutcomeCase{"oneArgument", kThreeRows, kHourly1, {Variant(int32_t(2))}, errc::WrongArgumentCount}),
     [](const auto& info) { return std::string(info.param.name); });
 
 TEST_F(Fixture, ExtraSeriesDrawAsZero)
@@ -208,18 +199,6 @@ TEST_F(Fixture, TwoRequestsInARowReplaceEverything)
     EXPECT_EQ(chart1().group1.seriesLabels, std::vector<std::string>{"Row 1"});
     EXPECT_EQ(modMain::gvArray.upper(0), 1);
     EXPECT_EQ(ui->windowLoads, 1);
-}
-
-TEST_F(Fixture, StoredStyleAppliesToTheRequest)
-{
-    writeSetting("Style", "Plot");
-    writeSetting("View3D", " 0");
-    writeSetting("LabelsOnDefault", "1");
-    setForm(formWithAllGrids(1, 2, 14));
-    ASSERT_EQ(request(kProp1, seriesAndTotal(2)), 0) << lastError;
-    EXPECT_EQ(chart1().group1.chartType, control::kPlot);
-    EXPECT_EQ(chart1().chartArea.view3D.depth, 0);
-    EXPECT_EQ(chart1().chartLabels.size(), 24u);
 }
 
 }  // namespace

@@ -62,11 +62,11 @@ struct NameRow : test::Named {
 
 const NameRow kNames[] = {
     {"AsDeclared", "Rows", FakeGrid::kRows},
-    {"LowerCase", "rows", FakeGrid::kRows},
     {"UpperCase", "FIXEDROWS", FakeGrid::kFixedRows},
     {"MixedCase", "tExTmAtRiX", FakeGrid::kTextMatrix},
     {"Prefix", "Row", 0},
     {"Longer", "Rowss", 0},
+    {"DifferentLetter", "Rowz", 0},
     {"TrailingBlank", "Rows ", 0},
     {"EmptyName", "", 0},
 };
@@ -156,32 +156,6 @@ TEST(DispatchCall, ObjectStaysAliveWhileItsMemberReleasesTheCaller)
     EXPECT_TRUE(holder.isEmpty());
     EXPECT_EQ(RefCounted::liveObjects(), live - 1) << "released after the call returned";
 }
-
-// ---- equalsNoCase ---------------------------------------------------------------------------
-
-struct EqualsRow : test::Named {
-    const char* a;
-    const char* b;
-    bool equal;
-};
-
-const EqualsRow kEquals[] = {
-    {"DifferentCase", "gridsettings1", "GridSettings1", true},
-    {"BothEmpty", "", "", true},
-    {"DifferentLength", "Rows", "Row", false},
-    {"DifferentLetter", "Rows", "Rowz", false},
-    {"DigitsMatter", "grid1", "grid2", false},
-    {"BlankMatters", "Rows", "Rows ", false},
-};
-
-class EqualsNoCase : public testing::TestWithParam<EqualsRow> {};
-
-TEST_P(EqualsNoCase, ComparesLettersWithoutCase)
-{
-    EXPECT_EQ(equalsNoCase(GetParam().a, GetParam().b), GetParam().equal);
-}
-
-INSTANTIATE_TEST_SUITE_P(Core, EqualsNoCase, testing::ValuesIn(kEquals), test::RowName{});
 
 }  // namespace
 }  // namespace kg

@@ -79,16 +79,6 @@ TEST(Ref, MovingTransfersWithoutCountingAndABaseReferenceCounts)
 
 // ---- objects held in Variants ---------------------------------------------------------------
 
-TEST(VariantObject, CopyingTheValueSharesTheObject)
-{
-    Log log;
-    Ref<Tracked> a = makeRef<Tracked>(&log, "shared");
-    Variant v(a);
-    Variant w = v;
-    EXPECT_EQ(a->refCount(), 3u);
-    EXPECT_EQ(w.object(), a.get());
-}
-
 TEST(VariantObject, StoringAnotherObjectOrValueReleasesTheOldOne)
 {
     Log log;

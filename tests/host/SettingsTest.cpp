@@ -141,20 +141,6 @@ TEST_F(SettingsStore, HandWrittenFileIsOwnerSectionKeyAndAWriteKeepsItsLayout)
     EXPECT_EQ(read("2dCharts", "Depth"), " 10");
 }
 
-TEST_F(SettingsStore, OwnersAreSectionsOfTheFile)
-{
-    write("2dCharts", "Style", "Area", "Tavix");
-    write("2dCharts", "Style", "Plot", "General");
-    write("Top", "Style", "Pie", "Other owner");
-    EXPECT_EQ(read("2dCharts", "Style", "", "Tavix"), "Area");
-    EXPECT_EQ(read("2dCharts", "Style", "", "General"), "Plot");
-    EXPECT_EQ(read("Top", "Style", "", "Other owner"), "Pie");
-    QSettings ini(QString::fromStdString(path_), QSettings::IniFormat);
-    EXPECT_EQ(ini.value("General/2dCharts/Style").toString(), "Plot");
-    EXPECT_EQ(ini.value("Other owner/Top/Style").toString(), "Pie");
-}
-
-
 TEST_F(SettingsStore, FailedWriteLeavesThePreviousFile)
 {
     write("2dCharts", "Style", "Pie");

@@ -7,9 +7,10 @@
 
 #include <QFile>
 #include <QImage>
+#include <QJsonArray>
+#include <QJsonDocument>
 #include <QTemporaryDir>
 #include <QXmlStreamReader>
-#include <cstdio>
 #include <fstream>
 #include <optional>
 #include <sys/resource.h>
@@ -27,22 +28,11 @@ constexpr DispId kBookings = 0x6003000C, kJobStatus = 0x6003000E;
 
 // ---- Form text -------------------------------------------------------------------------------
 
+// A text as a JSON string, control characters escaped.
 std::string quoted(const std::string& text)
 {
-    std::string out = "\"";
-    for (unsigned char c : text) {
-        if (c == '"' || c == '\\') {
-            out += '\\';
-            out += char(c);
-        } else if (c < 0x20) {
-            char esc[8];
-            std::snprintf(esc, sizeof esc, "\\u%04x", c);
-            out += esc;
-        } else {
-            out += char(c);
-        }
-    }
-    return out + "\"";
+    const QByteArray list = QJsonDocument(QJsonArray{QString::fromStdString(text)}).toJson(QJsonDocument::Compact);
+    return list.mid(1, list.size() - 2).toStdString();
 }
 
 // A grid: one caption row ("" then "C1".."Cn-1"), then `dataRows` rows "Row k" with values; any
@@ -137,6 +127,15 @@ struct EdgeFixture : test::RequestFixture {
         }
         EXPECT_EQ(ui->mousePointer(), kPointerDefault);
     }
+    // The request on a form of one grid charts (and paints) or fails as expected, within `mb` MB.
+    void expectOnGrid(const std::string& grid, DispId id, Args args, const Expected& e, long long mb = 512)
+    {
+        setForm("{\"grid1\": " + grid + "}");
+        PeakMemory peak;
+        expectOutcome(id, std::move(args), e);
+        if (e.error == 0) expectPaints();
+        EXPECT_LT(peak.growthMb(), mb) << "MB taken by the request";
+    }
     // The chart shown paints, and the picture is not blank.
     void expectPaints()
     {
@@ -165,12 +164,7 @@ class GridShapes : public EdgeFixture, public ::testing::WithParamInterface<Shap
 TEST_P(GridShapes, ChartOrFailCleanlyWithinBoundedMemory)
 {
     const ShapeCase& c = GetParam();
-    const std::string grid = gridJson({c.dataRows, c.cols, nullptr});
-    setForm("{\"grid1\": " + grid + "}");
-    PeakMemory peak;
-    expectOutcome(c.id, {Variant(c.lNumSeries), Variant(10.0)}, c.expected);
-    if (c.expected.error == 0) expectPaints();
-    EXPECT_LT(peak.growthMb(), 512) << "MB taken by the request";
+    expectOnGrid(gridJson({c.dataRows, c.cols, nullptr}), c.id, {Variant(c.lNumSeries), Variant(10.0)}, c.expected);
 }
 
 INSTANTIATE_TEST_SUITE_P(
@@ -179,10 +173,8 @@ INSTANTIATE_TEST_SUITE_P(
         // Hourly charts columns 1..cols-2: with fewer than 3 columns there is no point to chart.
         ShapeCase{"zeroColumnsHourly", kHourly1, 2, 0, 2, {errc::SubscriptOutOfRange, "0 To -2"}},
         ShapeCase{"zeroColumnsProp", kProp1, 2, 0, 2, {errc::SubscriptOutOfRange, "grid1.textmatrix(1, 0)"}},
-        ShapeCase{"oneColumnHourly", kHourly1, 2, 1, 2, {errc::SubscriptOutOfRange, "0 To -1"}},
         ShapeCase{"oneColumnYearly", kYearly1, 2, 1, 2, {errc::SubscriptOutOfRange, "grid1.textmatrix(0, 1)"}},
         ShapeCase{"tenThousandColumnsHourly", kHourly1, 2, 10000, 2, kCharts},
-        ShapeCase{"tenThousandColumnsYearly", kYearly1, 2, 10000, 2, kCharts},
         ShapeCase{"hundredThousandRowsAsSeries", kHourly1, 100000, 3, 100000, kCharts},
         // More rows than lNumSeries: the row beyond the table is out of its range.
         ShapeCase{"hundredThousandRowsTwoSeries", kHourly1, 100000, 3, 2, {errc::SubscriptOutOfRange, "(3, 1)"}}),
@@ -230,11 +222,7 @@ TEST_P(BigCells, ChartOrFailWithAShortDescription)
                                            if (r == c.row && col == c.col) return c.text;
                                            return std::nullopt;
                                        }});
-    setForm("{\"grid1\": " + grid + "}");
-    PeakMemory peak;
-    expectOutcome(kHourly1, {Variant(int32_t(2)), Variant(10.0)}, c.expected);
-    if (c.expected.error == 0) expectPaints();
-    EXPECT_LT(peak.growthMb(), 512);
+    expectOnGrid(grid, kHourly1, {Variant(int32_t(2)), Variant(10.0)}, c.expected);
 }
 
 INSTANTIATE_TEST_SUITE_P(
@@ -323,13 +311,10 @@ TEST_P(Captions, AreDrawnExportedAndEscaped)
 INSTANTIATE_TEST_SUITE_P(
     Table, Captions,
     ::testing::Values(CaptionCase{"controlCharacters", "Line\x01One\x07Two\x1B"},
-                      CaptionCase{"tabsAndLineEnds", "Tab\there\r\nnext"},
                       CaptionCase{"deleteCharacter", "Del\x7F" "ete"},
                       CaptionCase{"markup", "<b>&amp; \"q\" 'a'</b>"},
                       CaptionCase{"chinese", "\u5e74\u5ea6\u62a5\u544a"},
                       CaptionCase{"arabic", "\u0627\u0644\u062d\u062c\u0648\u0632\u0627\u062a"},
-                      CaptionCase{"hebrew", "\u05d4\u05d6\u05de\u05e0\u05d5\u05ea"},
-                      CaptionCase{"greekCyrillic", "\u039a\u03c1\u03ac\u03c4\u03b7\u03c3\u03b7 \u0411\u0440\u043e\u043d\u044c"},
                       CaptionCase{"devanagari", "\u092c\u0941\u0915\u093f\u0902\u0917"},
                       CaptionCase{"emoji", "Bookings \U0001F4C8"},
                       CaptionCase{"combining", "e\u0301te\u0301"}),
@@ -346,16 +331,6 @@ struct DateCase {
 };
 
 class DateLimits : public EdgeFixture, public ::testing::WithParamInterface<DateCase> {};
-
-TEST_P(DateLimits, BookingsTitleShowsTheDates)
-{
-    const DateCase& c = GetParam();
-    setForm("{\"gridsettings1\": " + settingsGridJson(3) + ", \"dtpFromDate\": \"" + c.from +
-            "\", \"dtpToDate\": \"" + c.to + "\"}");
-    ui->choices = {1};
-    expectOutcome(kBookings, {}, kCharts);
-    EXPECT_EQ(chart1().chartArea.x.title, c.xTitle);
-}
 
 // One confirmed job on each of the first and the last day of the date type.
 void writeJobsAtTheLimits(const std::string& path)
@@ -393,14 +368,6 @@ INSTANTIATE_TEST_SUITE_P(Table, DateLimits,
                                            DateCase{"lastDay", "9999-12-31", "9999-12-31", "31/12/9999 - 31/12/9999", 1}),
                          [](const auto& info) { return std::string(info.param.name); });
 
-TEST_F(EdgeFixture, ReversedLimitDatesAreRefusedByMessage)
-{
-    setForm(R"({"dtpFromDate": "9999-12-31", "dtpToDate": "0100-01-01", "cboFields": {"1": ["a"]}})");
-    ASSERT_EQ(request(kJobStatus), 0) << lastError;
-    EXPECT_EQ(ui->messages, std::vector<std::string>{"The FromDate must be less than or equal to the ToDate"});
-    EXPECT_EQ(ui->mousePointer(), kPointerDefault);
-}
-
 // ---- lNumSeries at the limits ----------------------------------------------------------------
 
 struct SeriesCase {
@@ -415,11 +382,7 @@ class SeriesCounts : public EdgeFixture, public ::testing::WithParamInterface<Se
 TEST_P(SeriesCounts, ChartOrFailWithoutAllocatingTheCount)
 {
     const SeriesCase& c = GetParam();
-    const std::string grid = test::gridJson(1, 2, 14);
-    setForm("{\"grid1\": " + grid + "}");
-    PeakMemory peak;
-    expectOutcome(c.id, {c.lNumSeries, Variant(10.0)}, c.expected);
-    EXPECT_LT(peak.growthMb(), 64) << "MB taken for a chart of two rows";
+    expectOnGrid(test::gridJson(1, 2, 14), c.id, {c.lNumSeries, Variant(10.0)}, c.expected, 64);
     EXPECT_LT(PeakMemory::highWaterKb() / 1024, 1024) << "MB resident";
 }
 
@@ -428,18 +391,12 @@ const int32_t kLongMax = 2147483647;
 INSTANTIATE_TEST_SUITE_P(
     Table, SeriesCounts,
     ::testing::Values(
-        SeriesCase{"minusOneHourly", kHourly1, Variant(int32_t(-1)), {errc::InvalidProcedureCall, "series count -1"}},
         SeriesCase{"minusOneYearly", kYearly1, Variant(int32_t(-1)), {errc::InvalidProcedureCall, "series count -1"}},
         // No series in the table: the first row's values have nowhere to go.
         SeriesCase{"zeroHourly", kHourly1, Variant(int32_t(0)), {errc::SubscriptOutOfRange, "(1, 1)"}},
         SeriesCase{"zeroProp", kProp1, Variant(int32_t(0)), {errc::SubscriptOutOfRange, "(1, 1)"}},
-        SeriesCase{"twoChart", kProp1, Variant(int32_t(2)), kCharts},
-        SeriesCase{"moreThanRowsChart", kHourly1, Variant(int32_t(40)), kCharts},
         SeriesCase{"longMaxHourly", kHourly1, Variant(kLongMax), {errc::InvalidProcedureCall, "series count 2147483647"}},
-        SeriesCase{"longMaxYearly", kYearly1, Variant(kLongMax), {errc::InvalidProcedureCall, "series count 2147483647"}},
-        SeriesCase{"beyondLong", kHourly1, Variant(2147483648.0), {errc::Overflow, "2147483648"}},
-        SeriesCase{"null", kHourly1, Variant::null(), {errc::InvalidUseOfNull, "Null"}},
-        SeriesCase{"text", kHourly1, Variant("many"), {errc::TypeMismatch, "\"many\""}}),
+        SeriesCase{"null", kHourly1, Variant::null(), {errc::InvalidUseOfNull, "Null"}}),
     [](const auto& info) { return std::string(info.param.name); });
 
 // With value labels on by default every cell of the table gets a label, so a series count far

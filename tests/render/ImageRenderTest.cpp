@@ -56,12 +56,10 @@ TEST_P(ChartLookTest, RendersAtTheRequestedSizeWithSeriesColours)
 
 INSTANTIATE_TEST_SUITE_P(
     Types, ChartLookTest,
-    ::testing::Values(Look{"barFlat", kBar, {0, 0, 0}, false}, Look{"bar3D", kBar, {10, 10, 10}, true},
-                      Look{"plotFlat", kPlot, {0, 0, 0}, true}, Look{"plot3D", kPlot, {10, 10, 10}, false},
-                      Look{"areaFlat", kArea, {0, 0, 0}, false}, Look{"area3D", kArea, {30, 20, 40}, true},
-                      Look{"pieFlat", kPie, {0, 0, 0}, true}, Look{"pie3D", kPie, {10, 45, 30}, true},
-                      Look{"unknownTypeAsBar", 7, {0, 0, 0}, false},
-                      Look{"bar3DLeftAndBelow", kBar, {-30, -20, 50}, true}),
+    // One look of each type; the gallery draws every type flat and in 3-D.
+    ::testing::Values(Look{"barFlat", kBar, {0, 0, 0}, false}, Look{"plotFlat", kPlot, {0, 0, 0}, true},
+                      Look{"area3D", kArea, {30, 20, 40}, true}, Look{"pie3D", kPie, {10, 45, 30}, true},
+                      Look{"unknownTypeAsBar", 7, {0, 0, 0}, false}, Look{"bar3DLeftAndBelow", kBar, {-30, -20, 50}, true}),
     samples::rowName);
 
 // Content that a careless painter would crash on or loop over.
@@ -99,7 +97,6 @@ INSTANTIATE_TEST_SUITE_P(Content, OddContentTest, ::testing::Values(
     OddCase{"notFiniteValues", [](C& c) { table(c, 2, 5, kPlot); c.data().setY(1, 2, kNaN);
                                           c.data().setY(2, 3, kInf); c.data().setY(2, 4, -kInf); }},
     OddCase{"hugeValues", [](C& c) { table(c, 2, 3, kBar); c.data().setY(1, 1, 1e308); c.data().setY(2, 1, -1e308); }},
-    OddCase{"tinyValues", [](C& c) { table(c, 1, 3, kArea); c.data().setY(1, 1, 1e-300); }},
     OddCase{"allNegative", [](C& c) { table(c, 2, 3, kArea);
                                       for (int p = 1; p <= 3; ++p) c.data().setY(1, p, -p * 10); }},
     OddCase{"xValuesOutOfOrder", [](C& c) { table(c, 2, 4, kBar); c.data().setX(1, 3, -7); }},
@@ -109,8 +106,6 @@ INSTANTIATE_TEST_SUITE_P(Content, OddContentTest, ::testing::Values(
                                            for (int p = 1; p <= 30; ++p) samples::addValueLabel(c, s, p, " 17"); }},
     OddCase{"labelOddSettings", [](C& c) { table(c, 1, 3, kBar); ChartLabel& l = samples::addValueLabel(c, 1, 2, "x");
                                            l.offset = -50; l.borderWidth = 1000; l.border = 6; }},
-    OddCase{"manyLegendEntries", [](C& c) { table(c, 500, 2, kPlot);
-                                            samples::addSeriesLabels(c, 500, "A rather long series caption "); }},
     OddCase{"hugeFonts", [](C& c) { table(c, 2, 3, kBar); c.header.font.size = 1e9;
                                     c.footer = {"Footer", {-5, true}}; }},
     OddCase{"oddBorders", [](C& c) { table(c, 2, 3, kBar); c.border = {6, 100000}; c.chartArea.border = {99, -3}; }},

@@ -44,9 +44,6 @@ INSTANTIATE_TEST_SUITE_P(
     Texts, DisplayTextTest,
     ::testing::Values(DisplayTextCase{"leadingBlanksKept", "  Total ", "  Total "},
                       DisplayTextCase{"lineBreaksAndTabsAsBlanks", "a\r\nb\tc", "a  b c"},
-                      DisplayTextCase{"otherControlsDropped", "a\x01" "b\x1F" "c", "abc"},
-                      DisplayTextCase{"nonLatinKept", "\xD0\x98\xD1\x82\xD0\xBE\xD0\xB3 \xE5\x90\x88\xE8\xA8\x88",
-                                      QString::fromUtf8("\xD0\x98\xD1\x82\xD0\xBE\xD0\xB3 \xE5\x90\x88\xE8\xA8\x88")},
                       DisplayTextCase{"megabyteCutToWhatAPageShows", kLongCaption, QString(2000, QLatin1Char('x'))},
                       DisplayTextCase{"cutNeverSplitsACharacter", kCutInAPair, QString(1999, QLatin1Char('a'))}),
     samples::rowName);
@@ -195,19 +192,6 @@ INSTANTIATE_TEST_SUITE_P(Labels, XLabelTest,
                                            XLabelCase{"notSetNumbers", 12, "Week ", kTarget, true, 0}),
                          samples::rowName);
 
-TEST(LayoutTest, YTicksAreRoundAndCoverTheData)
-{
-    ChartControl c;
-    barChart(c, 3, 5);
-    c.data().setY(2, 3, 173.4);
-    const ChartLayout L = computeLayout(c, kTarget);
-    EXPECT_LE(L.yScale.min, 0);
-    EXPECT_GE(L.yScale.max, 173.4);
-    EXPECT_GE(L.yLabels.size(), size_t(5));
-    EXPECT_LE(L.yLabels.size(), size_t(12));
-    const double mantissa = L.yScale.step / std::pow(10.0, std::floor(std::log10(L.yScale.step)));
-    EXPECT_TRUE(mantissa == 1 || mantissa == 2 || mantissa == 2.5 || mantissa == 5) << mantissa;
-}
 
 TEST(LayoutTest, ValueLabelsGetRoomAboveTheHighestBar)
 {
@@ -289,61 +273,6 @@ INSTANTIATE_TEST_SUITE_P(Pies, PieSliceTest,
                                            PieCase{"negativeSkipped", {-1, 2, 3}, {2, 3}},
                                            PieCase{"nothingPositive", {0, -2}, {}}, PieCase{"none", {}, {}},
                                            PieCase{"tilted3D", {1, 2, 3}, {1, 2, 3}, {0, 45, 20}}),
-                         samples::rowName);
-
-struct ViewCase {
-    const char* name;
-    ViewState view;
-};
-
-class ViewMappingTest : public ::testing::TestWithParam<ViewCase> {};
-
-// Only the chart area's content moves: scaled about its centre, then moved by the offsets times
-// its size; data values still round-trip through screen positions.
-TEST_P(ViewMappingTest, MovesTheChartAreaContentOnly)
-{
-    ChartControl c;
-    const ChartLayout plain = computeLayout(barChart(c, 3, 12), kTarget);
-    const ViewState& v = GetParam().view;
-    c.view = v;
-    const ChartLayout L = computeLayout(c, kTarget);
-    EXPECT_EQ(L.header, plain.header);
-    EXPECT_EQ(L.legend, plain.legend);
-    EXPECT_EQ(L.chartArea, plain.chartArea);
-    const QPointF centre = plain.chartContent.center();
-    const QPointF movedCentre = L.view.map(centre);
-    EXPECT_NEAR(movedCentre.x(), centre.x() + v.offsetX * plain.chartContent.width(), 1e-9);
-    EXPECT_NEAR(movedCentre.y(), centre.y() + v.offsetY * plain.chartContent.height(), 1e-9);
-    EXPECT_NEAR(L.toScreen(1, 0).x() - movedCentre.x(), v.scale * (plain.toScreen(1, 0).x() - centre.x()), 1e-9);
-    for (const QPointF& value : {QPointF(1, 0), QPointF(6.5, 42), QPointF(12, 88.25)}) {
-        QPointF back;
-        ASSERT_TRUE(L.toValue(L.toScreen(value.x(), value.y()), back));
-        EXPECT_NEAR(back.x(), value.x(), 1e-9);
-        EXPECT_NEAR(back.y(), value.y(), 1e-9);
-    }
-}
-
-INSTANTIATE_TEST_SUITE_P(Views, ViewMappingTest,
-                         ::testing::Values(ViewCase{"identity", {}}, ViewCase{"scaled", {2, 0, 0}},
-                                           ViewCase{"moved", {1, 0.25, -0.1}},
-                                           ViewCase{"scaledAndMoved", {0.5, -0.2, 0.3}}),
-                         samples::rowName);
-
-struct KindCase {
-    const char* name;
-    int16_t code;
-    ChartKind kind;
-};
-
-class ChartKindTest : public ::testing::TestWithParam<KindCase> {};
-
-TEST_P(ChartKindTest, UnknownCodesDrawAsBars) { EXPECT_EQ(chartKindOf(GetParam().code), GetParam().kind); }
-
-INSTANTIATE_TEST_SUITE_P(Codes, ChartKindTest,
-                         ::testing::Values(KindCase{"plot", 1, ChartKind::Plot}, KindCase{"bar", 2, ChartKind::Bar},
-                                           KindCase{"pie", 3, ChartKind::Pie}, KindCase{"area", 5, ChartKind::Area},
-                                           KindCase{"notSet", 0, ChartKind::Bar}, KindCase{"four", 4, ChartKind::Bar},
-                                           KindCase{"negative", -1, ChartKind::Bar}),
                          samples::rowName);
 
 }  // namespace

@@ -25,15 +25,15 @@ struct AdvancedHelpFixture : UiFixture {
         host::teststand::setShellErrorReporter({});
         UiFixture::TearDown();
     }
-    // Puts a help file into the application folder (the fixture's temporary folder).
-    std::string writeHelpFile()
+    // Puts a help file into an application folder, by default the fixture's temporary folder.
+    std::string writeHelpFile(QString folder = {})
     {
-        QDir(dir.path()).mkpath("Help");
-        const QString path = dir.filePath("Help/chartctl.hlp");
-        QFile f(path);
+        if (folder.isEmpty()) folder = dir.path();
+        QDir(folder).mkpath("Help");
+        QFile f(folder + "/Help/chartctl.hlp");
         EXPECT_TRUE(f.open(QIODevice::WriteOnly));
         f.write("help\n");
-        return path.toStdString();
+        return f.fileName().toStdString();
     }
     std::string expectedPath() const { return dir.path().toStdString() + "/Help/chartctl.hlp"; }
 };
@@ -104,10 +104,7 @@ TEST_F(AdvancedHelpFixture, OpenerGetsThePathAsOneArgumentWithoutAShell)
 {
     // An application folder whose name a shell would split and expand.
     const QString folder = dir.filePath("Tavix $HOME 'x' ; y");
-    QDir().mkpath(folder + "/Help");
-    QFile help(folder + "/Help/chartctl.hlp");
-    ASSERT_TRUE(help.open(QIODevice::WriteOnly));
-    help.close();
+    writeHelpFile(folder);
     host::teststand::config().appFolder = folder.toStdString();
     modMain::GraphInitialize();
 

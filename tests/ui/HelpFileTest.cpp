@@ -33,27 +33,17 @@ TEST(HelpFile, IsPlainUtf8TextAndSaysSoAtTheTop)
     EXPECT_TRUE(top.contains("plain UTF-8 text")) << top.toStdString();
 }
 
-TEST(HelpFile, IsShippedBesideTheBuiltProgramsForTheTestStand)
-{
-    EXPECT_TRUE(QFile::exists(QStringLiteral(KG_BUILD_DIR "/Help/chartctl.hlp")));
-}
-
 struct TopicCase {
     const char* name;
     std::vector<const char*> words;
 };
 
+// A few key phrases per topic: enough to show the topic is there, not a copy of its wording.
 const TopicCase kTopics[] = {
-    {"MenuWithShortcuts",
-     {"Chart Settings", "F2", "Print Chart", "F8", "Close", "Ctrl+X", "Labels On", "F3", "Labels Off", "F4",
-      "Redraw", "F5", "Mouse and Keys Help", "Ctrl+F1", "Advanced Chart Help", "F1", "Save As...", "Copy"}},
-    {"MouseAndKeys",
-     {"Ctrl", "Shift", "both mouse buttons", "middle button", "left mouse button", "mouse wheel", "Escape",
-      "\"r\"", "Graphics zoom", "Axis zoom", "Rotate", "Scale", "Move", "tip"}},
-    {"ChartTypes", {"Plot", "Bar", "Area", "Pie", "single series"}},
-    {"View3D", {"Rotation", "Elevation", "Depth", "-45 to 45", "Show 3D Chart"}},
-    {"LabelsAndLegend", {"Value labels", "Default - Labels ON", "legend"}},
-    {"PrintingAndExport", {"landscape", "one page", "PNG", "SVG", "PDF", "clipboard"}},
+    {"MenuWithShortcuts", {"Chart Settings", "F2", "Advanced Chart Help", "Save As..."}},
+    {"MouseAndKeys", {"Graphics zoom", "Axis zoom", "middle button", "Escape"}},
+    {"ChartTypesAndView3D", {"Plot", "Pie", "Rotation", "-45 to 45"}},
+    {"LabelsPrintingAndExport", {"Value labels", "legend", "landscape", "PDF", "clipboard"}},
 };
 
 struct Topic : ::testing::TestWithParam<TopicCase> {};

@@ -95,15 +95,14 @@ struct Section {
     std::vector<const char*> words;  // each must appear in the steps under the heading
 };
 
+// The headings in order, and a key phrase or two that each one's steps must name.
 const Section kSections[] = {
-    {"To Scale the Chart:", {"Ctrl", "both mouse buttons", "middle button", "down", "enlarge", "up", "shrink", "wheel"}},
-    {"To Move the Chart:", {"Shift", "both mouse buttons", "middle button", "Move the mouse"}},
-    {"To Graphics Zoom an Area of the Chart:", {"Ctrl", "left mouse button", "Drag", "Release", "Escape"}},
-    {"To Axis Zoom the Chart:", {"Shift", "left mouse button", "Drag", "Release", "minimum and maximum", "tick", "Escape"}},
-    {"To Rotate the Chart (Bar/Pie charts displaying 3D effect only):",
-     {"both mouse buttons", "middle button", "without", "up or down", "elevation", "bar charts", "left or right",
-      "rotation", "-45 to 45"}},
-    {"To Reset to Automatic Scale and Position:", {"\"r\"", "margins"}},
+    {"To Scale the Chart:", {"Ctrl", "wheel"}},
+    {"To Move the Chart:", {"Shift", "Move the mouse"}},
+    {"To Graphics Zoom an Area of the Chart:", {"left mouse button", "Escape"}},
+    {"To Axis Zoom the Chart:", {"Shift", "minimum and maximum"}},
+    {"To Rotate the Chart (Bar/Pie charts displaying 3D effect only):", {"elevation", "-45 to 45"}},
+    {"To Reset to Automatic Scale and Position:", {"\"r\""}},
 };
 
 TEST_F(HelpText, EveryFragmentIsArial8Point)
@@ -117,18 +116,9 @@ TEST_F(HelpText, EveryFragmentIsArial8Point)
 TEST_F(HelpText, OpensWithTheBoldTitleThenTwoParagraphsThenSpecialNotes)
 {
     ASSERT_GE(blocks.size(), 7u);
-    const auto has = [&](size_t i, const char* a, const char* b) {
-        return blocks[i].text.contains(a) && blocks[i].text.contains(b);
-    };
     EXPECT_EQ(blocks[0].text, "Interacting with the Chart");
-    EXPECT_TRUE(has(1, "chart area", "header"));
-    EXPECT_TRUE(has(1, "series", "value"));  // the tooltip
-    EXPECT_TRUE(has(2, "Graphics zoom", "Axis zoom"));
     EXPECT_EQ(blocks[3].text, "Special Notes");
-    // Two notes, then the first interaction heading.
-    EXPECT_TRUE(blocks[4].text.contains("programmer"));
-    EXPECT_TRUE(blocks[5].text.contains("margins"));
-    EXPECT_EQ(blocks[6].text, kSections[0].heading);
+    EXPECT_EQ(blocks[6].text, kSections[0].heading);  // after the two notes
     for (size_t i = 0; i < 6; ++i) EXPECT_EQ(blocks[i].bold, i == 0 || i == 3) << i;
 }
 
@@ -175,27 +165,6 @@ TEST_F(HelpFixture, OpensAsDesignedAndReportsItsLoad)
     EXPECT_EQ(events(), std::vector<std::string>{"FormLoad frmChartHelp"});
 }
 
-struct ResizeCase {
-    const char* name;
-    QSize size;
-};
-
-const ResizeCase kResizes[] = {{"Larger", {900, 600}}, {"Smaller", {200, 120}}};
-
-struct Resize : HelpFixture, ::testing::WithParamInterface<ResizeCase> {};
-
-TEST_P(Resize, TextFillsTheWindow)
-{
-    showChartHelp();
-    frmChartHelp* w = chartHelpWindow();
-    w->resize(GetParam().size);
-    QCoreApplication::processEvents();
-    EXPECT_EQ(w->Text1->geometry(), QRect(QPoint(0, 0), w->size()));
-    EXPECT_EQ(w->size(), GetParam().size);
-}
-
-INSTANTIATE_TEST_SUITE_P(ChartHelp, Resize, ::testing::ValuesIn(kResizes), byName);
-
 TEST_F(HelpFixture, SecondShowReusesTheWindow)
 {
     showChartHelp();
@@ -207,11 +176,12 @@ TEST_F(HelpFixture, SecondShowReusesTheWindow)
     EXPECT_EQ(events(), std::vector<std::string>{"FormLoad frmChartHelp"});  // loaded once
 }
 
-TEST_F(HelpFixture, ClosingSavesThePlacementUnderChartHelpAndTheNextOneRestoresIt)
+TEST_F(HelpFixture, TextFollowsAResizeAndClosingSavesThePlacementUnderChartHelp)
 {
     showChartHelp();
     chartHelpWindow()->resize(500, 300);
     QCoreApplication::processEvents();
+    EXPECT_EQ(chartHelpWindow()->Text1->geometry(), QRect(0, 0, 500, 300)) << "the text follows the window";
     closeHelp();
     EXPECT_EQ(chartHelpWindow(), nullptr);
     EXPECT_EQ(storedPlacement("ChartHelp", "Width"), "7500");

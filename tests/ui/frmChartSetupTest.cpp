@@ -6,15 +6,14 @@
 #include <QPushButton>
 #include <QRadioButton>
 #include <QtTest/QTest>
+#include <algorithm>
 #include <array>
-#include <functional>
 #include <map>
 #include <optional>
-#include <ostream>
 #include <sstream>
 #include <tuple>
 
-#include "core/Convert.h"
+#include "support/FakeHost.h"
 #include "ui/NumericField.h"
 #include "ui/frmChartSetup.h"
 #include "ui/UiFixture.h"
@@ -29,25 +28,11 @@ constexpr std::array<const char*, 6> kKeys = {"View3D", "Rotation", "Elevation",
 using Stored = std::map<std::string, std::string>;
 using StoredAfter = std::array<std::optional<std::string>, 6>;  // by kKeys; nullopt: never written
 
-struct ChartState {
-    bool view3D;
-    int32_t rotation, elevation, depth;
-    int16_t chartType;
-    bool pointLabels;
-    bool operator==(const ChartState& o) const
-    {
-        return std::tie(view3D, rotation, elevation, depth, chartType, pointLabels) ==
-               std::tie(o.view3D, o.rotation, o.elevation, o.depth, o.chartType, o.pointLabels);
-    }
-};
-std::ostream& operator<<(std::ostream& os, const ChartState& s)
-{
-    return os << "{view3D " << s.view3D << ", " << s.rotation << "/" << s.elevation << "/" << s.depth << ", type "
-              << s.chartType << ", labels " << s.pointLabels << "}";
-}
+// View3D, rotation, elevation, depth, chart type, point labels.
+using ChartState = std::tuple<bool, int32_t, int32_t, int32_t, int16_t, bool>;
 
 // What the chart holds before each case: no value a dialog would give by default.
-constexpr ChartState kBefore{false, 7, 8, 9, 1, true};
+const ChartState kBefore{false, 7, 8, 9, 1, true};
 
 // Works the dialog as a user does, step by step: "3d" clicks the box; "rot=-20", "elev=45",
 // "depth=0" type into a field ("elev=" empties it); "type=3" and "label=0" click an option; "ok",
@@ -90,12 +75,12 @@ struct SetupFixture : UiFixture {
     {
         UiFixture::SetUp();
         c2dChart& chart = modMain::chart();
-        chart.setView3D(kBefore.view3D);
-        chart.setRotation(kBefore.rotation);
-        chart.setElevation(kBefore.elevation);
-        chart.setDepth(kBefore.depth);
-        chart.setChartType(kBefore.chartType);
-        chart.setPointLabels(kBefore.pointLabels);
+        chart.setView3D(std::get<0>(kBefore));
+        chart.setRotation(std::get<1>(kBefore));
+        chart.setElevation(std::get<2>(kBefore));
+        chart.setDepth(std::get<3>(kBefore));
+        chart.setChartType(std::get<4>(kBefore));
+        chart.setPointLabels(std::get<5>(kBefore));
     }
     void store(const Stored& stored)
     {
@@ -137,16 +122,10 @@ const RoundTripCase kRoundTrips[] = {
      {false, 0, 0, 0, 2, false}},
     {"StoredOffTickedAgainBringsAnglesBack", {{"View3D", " 0"}, {"Rotation", "-5"}}, "3d ok",
      {" 1", "-5", " 10", " 10", "Bar", "0"}, {true, -5, 10, 10, 2, false}},
-    {"StoredOffUnchanged", {{"View3D", " 0"}, {"Elevation", " 12"}}, "ok", {" 0", " 10", " 12", " 10", "Bar", "0"},
-     {false, 0, 0, 0, 2, false}},
     {"BeyondLimitsStoredClampedOnOk", {{"Rotation", "99"}, {"Elevation", "-99"}, {"Depth", "1E999"}}, "ok",
      {" 1", " 45", "-45", " 45", "Bar", "0"}, {true, 45, -45, 45, 2, false}},
     {"TextWithoutNumberReadsZero", {{"View3D", "abc"}, {"Rotation", "abc"}, {"Depth", ""}}, "ok",
      {" 0", " 0", " 10", " 0", "Bar", "0"}, {false, 0, 0, 0, 2, false}},
-    {"LeadingNumberReadAndRounded", {{"Rotation", " 12abc"}, {"Elevation", "10.6"}, {"Depth", "-10.5"}}, "ok",
-     {" 1", " 12", " 11", "-11", "Bar", "0"}, {true, 12, 11, -11, 2, false}},
-    {"View3DTwoLeavesBoxTicked", {{"View3D", "2"}}, "ok", {" 1", " 10", " 10", " 10", "Bar", "0"},
-     {true, 10, 10, 10, 2, false}},
     {"View3DTooLargeLeavesBoxTicked", {{"View3D", "40000"}, {"Rotation", " 3"}}, "ok",
      {" 1", " 3", " 10", " 10", "Bar", "0"}, {true, 3, 10, 10, 2, false}},
     {"StyleInOtherCaseKeepsBar", {{"Style", "pie"}, {"LabelsOnDefault", "yes"}}, "ok",
@@ -158,8 +137,8 @@ const RoundTripCase kRoundTrips[] = {
      {" 1", " 10", " 10", " 10", "Bar", "0"}, {true, 10, 10, 10, 2, false}},
     {"EmptiedFieldStoredEmptyChartGetsZero", {}, "elev= ok", {" 1", " 10", "", " 10", "Bar", "0"},
      {true, 10, 0, 10, 2, false}},
-    {"SwitchedOffFieldTakesNoTyping", {{"View3D", " 0"}}, "rot=33 ok", {" 0", " 10", " 10", " 10", "Bar", "0"},
-     {false, 0, 0, 0, 2, false}},
+    {"SwitchedOffFieldTakesNoTypingAndKeepsItsValue", {{"View3D", " 0"}, {"Elevation", " 12"}}, "rot=33 ok",
+     {" 0", " 10", " 12", " 10", "Bar", "0"}, {false, 0, 0, 0, 2, false}},
     {"CancelAfterChangingEverything",
      {{"View3D", " 0"}, {"Rotation", " 5"}, {"Style", "Area"}, {"LabelsOnDefault", "1"}},
      "3d rot=-7 elev=30 type=3 label=1 cancel", {" 0", " 5", std::nullopt, std::nullopt, "Area", "1"}, kBefore},
@@ -195,16 +174,10 @@ struct LoadCase {
 const LoadCase kLoads[] = {
     {"NothingStored", {}, true, {"10", "10", "10"}, 1, 1},
     {"StoredOffSwitchesFieldsOff", {{"View3D", " 0"}}, false, {"10", "10", "10"}, 1, 1},
-    {"View3DRoundsToOne", {{"View3D", "0.6"}}, true, {"10", "10", "10"}, 1, 1},
     {"View3DHalfRoundsToEvenZero", {{"View3D", "0.5"}}, false, {"10", "10", "10"}, 1, 1},
     {"View3DMinusOneLeftAsDesigned", {{"View3D", "-1"}}, true, {"10", "10", "10"}, 1, 1},
-    {"AnglesWithoutNumberReadZero", {{"Rotation", "abc"}, {"Elevation", ""}, {"Depth", "-"}}, true, {"0", "0", "0"},
-     1, 1},
-    {"AnglesShownWhole", {{"Rotation", "2.5"}, {"Elevation", "-2.5"}, {"Depth", "&H1F"}}, true, {"3", "-3", "31"}, 1,
-     1},
     {"StylePie", {{"Style", "Pie"}}, true, {"10", "10", "10"}, 3, 1},
     {"StyleWithBlankLeftAsDesigned", {{"Style", " Pie"}}, true, {"10", "10", "10"}, 1, 1},
-    {"LabelsNumberTextLeftAsDesigned", {{"LabelsOnDefault", " 1"}}, true, {"10", "10", "10"}, 1, 1},
 };
 
 struct Load : SetupFixture, ::testing::WithParamInterface<LoadCase> {};
@@ -229,7 +202,7 @@ INSTANTIATE_TEST_SUITE_P(ChartSetup, Load, ::testing::ValuesIn(kLoads), byName);
 
 // ---- The design ----------------------------------------------------------------------------------
 
-TEST_F(SetupFixture, ControlsAreNamedCaptionedAndPlacedAsDesigned)
+TEST_F(SetupFixture, ControlsAreNamedAndCaptionedAsDesigned)
 {
     frmChartSetup d;
     EXPECT_EQ(d.objectName(), "frmChartSetup");
@@ -254,33 +227,9 @@ TEST_F(SetupFixture, ControlsAreNamedCaptionedAndPlacedAsDesigned)
     EXPECT_EQ(d.optLabel[1]->text(), "Default - Labels OFF");
     EXPECT_EQ(d.Command1->text(), "OK");
     EXPECT_EQ(d.Command2->text(), "Cancel");
-
-    // The fields and the check box sit in Frame1, the chart types in Frame2.
-    EXPECT_EQ(d.chk3D->parentWidget(), d.Frame1);
-    EXPECT_EQ(d.num3D[2]->parentWidget(), d.Frame1);
-    EXPECT_EQ(d.optChartType[2]->parentWidget(), d.Frame2);
-    // Each label to the right of its field, on its row; rows top to bottom below the box.
-    QLabel* labels[3] = {d.Label1, d.Label2, d.Label3};
-    const char* captions[3] = {"Rotation", "Elevation", "Depth"};
-    for (int i = 0; i < 3; ++i) {
-        EXPECT_EQ(labels[i]->text(), captions[i]);
-        EXPECT_GE(labels[i]->x(), d.num3D[i]->geometry().right());
-        EXPECT_EQ(labels[i]->y(), d.num3D[i]->y());
-        EXPECT_GT(d.num3D[i]->y(), d.chk3D->geometry().bottom());
-        EXPECT_TRUE(i == 0 || d.num3D[i]->y() > d.num3D[i - 1]->y()) << i;
-    }
-    // Plot upper left, Bar lower left, Area upper right, Pie lower right.
-    EXPECT_EQ(d.optChartType[0]->x(), d.optChartType[1]->x());
-    EXPECT_LT(d.optChartType[0]->y(), d.optChartType[1]->y());
-    EXPECT_GT(d.optChartType[2]->x(), d.optChartType[0]->x());
-    EXPECT_EQ(d.optChartType[2]->y(), d.optChartType[0]->y());
-    EXPECT_EQ(d.optChartType[3]->pos(), QPoint(d.optChartType[2]->x(), d.optChartType[1]->y()));
-    // Frame1 left, Frame2 right; the label options below Frame2; the buttons bottom right.
-    EXPECT_LT(d.Frame1->x(), d.Frame2->x());
-    EXPECT_GT(d.optLabel[0]->y(), d.Frame2->geometry().bottom());
-    EXPECT_GT(d.optLabel[1]->y(), d.optLabel[0]->y());
-    EXPECT_GT(d.Command2->x(), d.Command1->geometry().right());
-    EXPECT_GT(d.Command1->x(), d.Label4->x());
+    EXPECT_EQ(d.Label1->text(), "Rotation");
+    EXPECT_EQ(d.Label2->text(), "Elevation");
+    EXPECT_EQ(d.Label3->text(), "Depth");
 }
 
 TEST_F(SetupFixture, ClearingTheBoxSwitchesTheFieldsOffAndTickingOn)
@@ -293,6 +242,22 @@ TEST_F(SetupFixture, ClearingTheBoxSwitchesTheFieldsOffAndTickingOn)
 }
 
 // ---- Calls to the host, in order -----------------------------------------------------------------
+
+// Host objects in memory in place of the test stand's, recording what they are asked.
+struct HostCallsFixture : SetupFixture {
+    Ref<FakeAppServices> services = makeRef<FakeAppServices>();
+    Ref<FakeSettings> settings = makeRef<FakeSettings>();
+    void SetUp() override
+    {
+        SetupFixture::SetUp();
+        modMain::goAppServices = Variant(services);
+        modMain::goSettings = Variant(settings);
+    }
+    int ownersAsked() const
+    {
+        return int(std::count(services->calls.begin(), services->calls.end(), "GetSettingsOwner"));
+    }
+};
 
 // Records every call of the application services and the settings store in one list; the owner
 // text changes with every GetSettingsOwner, so a read with a stale owner shows.
@@ -386,23 +351,16 @@ const CloseCase kCloses[] = {
     {"NoAnswer", nullptr, false},
 };
 
-struct Close : SetupFixture, ::testing::WithParamInterface<CloseCase> {};
+struct Close : HostCallsFixture, ::testing::WithParamInterface<CloseCase> {};
 
 TEST_P(Close, ReportsTheUnloadOnceAndAppliesOnlyOk)
 {
-    CallLog log;
-    recordHostCalls(log);
     if (GetParam().script) answer(GetParam().script);
     ui::showChartSetup();
-    int unloads = 0, writes = 0;
-    for (const std::string& line : log.lines) {
-        unloads += line == "LogFormEvent FormQueryUnload frmChartSetup";
-        writes += line.rfind("Write ", 0) == 0;
-    }
-    EXPECT_EQ(unloads, 1);
-    EXPECT_EQ(log.lines.back(), "LogFormEvent FormQueryUnload frmChartSetup");
-    EXPECT_EQ(writes, GetParam().writes ? 6 : 0);
-    EXPECT_EQ(chartState() == kBefore, !GetParam().writes) << chartState();
+    EXPECT_EQ(services->events.back(), "FormQueryUnload|frmChartSetup");
+    EXPECT_EQ(std::count(services->events.begin(), services->events.end(), "FormQueryUnload|frmChartSetup"), 1);
+    EXPECT_EQ(settings->values.size(), GetParam().writes ? 6u : 0u);
+    EXPECT_EQ(chartState() == kBefore, !GetParam().writes) << ::testing::PrintToString(chartState());
 }
 
 INSTANTIATE_TEST_SUITE_P(ChartSetup, Close, ::testing::ValuesIn(kCloses), byName);
@@ -427,41 +385,12 @@ TEST_F(SetupFixture, FailingWriteEndsOkAndLeavesShowChartSetupWithTheError)
     EXPECT_EQ(chartState(), kBefore);
 }
 
-TEST_F(SetupFixture, FailingReadEndsTheLoadBeforeTheDialogShows)
-{
-    host::teststand::FaultPlan::failOn("Settings.ReadSetting", 2);
-    EXPECT_THROW(ui::showChartSetup(), Error);
-    EXPECT_TRUE(prompts->dialogsShown.empty());
-}
-
 TEST_F(SetupFixture, OkWithoutChartObjectStoresThenFailsWithError91)
 {
     modMain::goChart.reset();
     answer("ok");
     EXPECT_EQ(errorNumberOf(ui::showChartSetup), errc::ObjectNotSet);
     EXPECT_EQ(storedStyle("LabelsOnDefault"), "0");
-}
-
-// ---- Settings outlast the dialog and the objects -------------------------------------------------
-
-TEST_F(SetupFixture, NextDialogAndNextChartStartFromTheStoredChoice)
-{
-    answer("rot=-30 type=2 label=0 ok");
-    ui::showChartSetup();
-
-    // A new set of host objects (as the next request makes) reads the same file.
-    modMain::releaseSharedObjects();
-    modMain::GraphInitialize();
-    frmChartSetup d;
-    EXPECT_EQ(d.num3D[0]->text(), "-30");
-    EXPECT_TRUE(d.optChartType[2]->isChecked());
-    EXPECT_TRUE(d.optLabel[0]->isChecked());
-
-    modMain::chart().Initialize(&modMain::chartWindow().Chart1(), "Header", "", "", "");
-    modMain::chart().InitChart();
-    EXPECT_EQ(modMain::chart().Rotation(), -30);
-    EXPECT_EQ(modMain::chart().ChartType(), 5);
-    EXPECT_TRUE(modMain::chart().PointLabels());
 }
 
 }  // namespace

@@ -58,6 +58,13 @@ struct ViewFixture : ::testing::Test {
         view.reset();
     }
 
+    // The monthly bars (or another type over the same figures) on a view of the usual size.
+    void showMonthly(int16_t chartType = kBar)
+    {
+        fillMonthlyBars(*chart, chartType);
+        makeView();
+    }
+
     ChartLayout layout() const { return computeLayout(*chart, QRectF(view->rect())); }
     QPoint areaCentre() const { return layout().chartContent.center().toPoint(); }
 

@@ -82,7 +82,6 @@ void labels(bool on)
 INSTANTIATE_TEST_SUITE_P(
     Afterwards, ViewLifecycleTest,
     ::testing::Values(AfterCase{"labelsOn", [](RequestFixture&) { labels(true); }, true},
-                      AfterCase{"labelsOff", [](RequestFixture&) { labels(false); }, true},
                       AfterCase{"styleDialogRedraw",
                                 [](RequestFixture&) {
                                     c2dChart& chart = modMain::chart();
