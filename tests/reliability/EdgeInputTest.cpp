@@ -173,6 +173,7 @@ INSTANTIATE_TEST_SUITE_P(
         // Hourly charts columns 1..cols-2: with fewer than 3 columns there is no point to chart.
         ShapeCase{"zeroColumnsHourly", kHourly1, 2, 0, 2, {errc::SubscriptOutOfRange, "0 To -2"}},
         ShapeCase{"zeroColumnsProp", kProp1, 2, 0, 2, {errc::SubscriptOutOfRange, "grid1.textmatrix(1, 0)"}},
+        ShapeCase{"oneColumnHourly", kHourly1, 2, 1, 2, {errc::SubscriptOutOfRange, "0 To -1"}},
         ShapeCase{"oneColumnYearly", kYearly1, 2, 1, 2, {errc::SubscriptOutOfRange, "grid1.textmatrix(0, 1)"}},
         ShapeCase{"tenThousandColumnsHourly", kHourly1, 2, 10000, 2, kCharts},
         ShapeCase{"hundredThousandRowsAsSeries", kHourly1, 100000, 3, 100000, kCharts},
@@ -396,7 +397,9 @@ INSTANTIATE_TEST_SUITE_P(
         SeriesCase{"zeroHourly", kHourly1, Variant(int32_t(0)), {errc::SubscriptOutOfRange, "(1, 1)"}},
         SeriesCase{"zeroProp", kProp1, Variant(int32_t(0)), {errc::SubscriptOutOfRange, "(1, 1)"}},
         SeriesCase{"longMaxHourly", kHourly1, Variant(kLongMax), {errc::InvalidProcedureCall, "series count 2147483647"}},
-        SeriesCase{"null", kHourly1, Variant::null(), {errc::InvalidUseOfNull, "Null"}}),
+        SeriesCase{"beyondLong", kHourly1, Variant(2147483648.0), {errc::Overflow, "2147483648"}},
+        SeriesCase{"null", kHourly1, Variant::null(), {errc::InvalidUseOfNull, "Null"}},
+        SeriesCase{"text", kHourly1, Variant("many"), {errc::TypeMismatch, "\"many\""}}),
     [](const auto& info) { return std::string(info.param.name); });
 
 // With value labels on by default every cell of the table gets a label, so a series count far
