@@ -147,9 +147,7 @@ void frmChart::mnuSaveAs_Click()
     const std::string path =
         prompter().askSaveFile("Save Chart As", "PNG image (*.png);;SVG drawing (*.svg);;PDF document (*.pdf)");
     if (path.empty()) return;
-    const QString file = QString::fromStdString(path);
-    const bool known = file.endsWith(".png") || file.endsWith(".svg") || file.endsWith(".pdf");
-    control::exportChart(*chart_, known ? path : path + ".png", shownSize(view_));
+    control::exportChart(*chart_, control::isExportFormat(path) ? path : path + ".png", shownSize(view_));
 }
 
 void frmChart::mnuCopy_Click()

@@ -9,6 +9,7 @@
 
 #include "apps/cli/Commands.h"
 #include "apps/cli/RequestRunner.h"
+#include "chart/control/render/ChartExport.h"
 #include "component/UiServices.h"
 #include "core/Convert.h"
 #include "core/Error.h"
@@ -57,13 +58,6 @@ bool parseWhole(const char* text, T& out)
     const char* end = text + std::strlen(text);
     auto [p, ec] = std::from_chars(text, end, out);
     return ec == std::errc() && p == end;
-}
-
-bool isExportFormat(const std::string& path)
-{
-    for (const char* ext : {".png", ".svg", ".pdf"})
-        if (path.size() > 4 && path.compare(path.size() - 4, 4, ext) == 0) return true;
-    return false;
 }
 
 // Returns an exit status when the arguments are unusable.
@@ -132,7 +126,7 @@ std::optional<int> parse(int argc, char** argv, Options& o)
     }
     if (o.form.empty() || o.call.request.empty()) return usage("a form file and a request are needed");
     if (o.output.empty()) return usage("-o OUT.png|OUT.svg|OUT.pdf is needed");
-    if (!isExportFormat(o.output)) return usage("the output must end in .png, .svg or .pdf: " + o.output);
+    if (!kg::control::isExportFormat(o.output)) return usage("the output must end in .png, .svg or .pdf: " + o.output);
     if (!kg::cli::isRequestName(o.call.request)) return usage("unknown request " + o.call.request);
     if (kg::cli::isMeasureRequest(o.call.request) && !o.call.choice)
         return usage(o.call.request + " needs --choice N for its data choice");

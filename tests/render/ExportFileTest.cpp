@@ -33,6 +33,7 @@ TEST_P(ExportFormatTest, WritesTheFormatTheExtensionNames)
     sampleChart(chart);
     QTemporaryDir dir = samples::scratchDir();
     const QString path = dir.filePath(QString::fromUtf8(GetParam().file));
+    EXPECT_TRUE(isExportFormat(path.toStdString()));  // what the window and the tool ask before exporting
     exportChart(chart, path.toStdString(), QSize(640, 480));
     const QByteArray bytes = samples::readAll(path);
     EXPECT_TRUE(bytes.startsWith(GetParam().signature)) << bytes.left(64).toStdString();
@@ -55,6 +56,12 @@ TEST(ExportFileTest, PngIsTheRenderedPicture)
     const QImage image(path);
     ASSERT_EQ(image.size(), QSize(800, 600));
     EXPECT_EQ(image.convertToFormat(QImage::Format_RGB32), renderImage(chart, QSize(800, 600)));
+}
+
+TEST(ExportFileTest, OtherExtensionsAreNoExportFormat)
+{
+    for (const char* file : {"chart.bmp", "chart", "chart.png.txt", "/tmp/png/chart"})
+        EXPECT_FALSE(isExportFormat(file)) << file;
 }
 
 struct FailureCase {

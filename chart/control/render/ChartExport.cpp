@@ -82,11 +82,21 @@ QImage renderImage(const ChartControl& chart, QSize size)
     return image;
 }
 
+namespace {
+QString suffixOf(const QString& file) { return QFileInfo(file).suffix().toLower(); }
+}  // namespace
+
+bool isExportFormat(const std::string& path)
+{
+    const QString suffix = suffixOf(QString::fromStdString(path));
+    return suffix == QLatin1String("png") || suffix == QLatin1String("svg") || suffix == QLatin1String("pdf");
+}
+
 void exportChart(const ChartControl& chart, const std::string& path, QSize size)
 {
     const QString file = QString::fromStdString(path);
-    const QString suffix = QFileInfo(file).suffix().toLower();
-    if (suffix != QLatin1String("png") && suffix != QLatin1String("svg") && suffix != QLatin1String("pdf")) {
+    const QString suffix = suffixOf(file);
+    if (!isExportFormat(path)) {
         throw Error::invalidCall("chart file type \"" +
                                  (suffix.isEmpty() ? std::string() : "." + suffix.toStdString()) + "\" of " + path +
                                  " (use .png, .svg or .pdf)");
