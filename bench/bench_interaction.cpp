@@ -11,7 +11,7 @@
 #include <QPainter>
 #include <string>
 
-#include "bench/BenchCharts.h"
+#include "BenchCharts.h"
 #include "chart/control/model/ChartControl.h"
 #include "chart/control/render/ChartLayout.h"
 #include "chart/control/render/ChartPainter.h"

@@ -7,11 +7,11 @@
 #include <QImage>
 
 #include "chart/control/render/ChartExport.h"
-#include "component/HeadlessUi.h"
-#include "component/cTavixGraph.h"
-#include "component/modMain.h"
-#include "host/SampleJobs.h"
-#include "host/TestStand.h"
+#include "requests/HeadlessUi.h"
+#include "requests/cTavixGraph.h"
+#include "requests/modMain.h"
+#include "teststand/SampleJobs.h"
+#include "teststand/TestStand.h"
 
 namespace {
 
@@ -23,17 +23,17 @@ struct Stand {
     {
         const std::string folder = QDir::tempPath().toStdString() + "/kg-bench-jobs";
         QDir().mkpath(QString::fromStdString(folder));
-        host::teststand::SampleJobsSpec spec;
+        teststand::SampleJobsSpec spec;
         spec.count = 100000;
         writeSampleJobs(folder + "/jobs.db", spec);
-        auto& cfg = host::teststand::config();
+        auto& cfg = teststand::config();
         cfg.jobsDatabase = folder + "/jobs.db";
         cfg.settingsFile = folder + "/settings.ini";
         cfg.appFolder = folder;
         // 100 000 jobs spread evenly over 2026: 73 days hold 20 000 of them.
         std::string list;
-        for (const std::string& c : host::teststand::jobStatusCaptions()) list += (list.empty() ? "\"" : ", \"") + c + "\"";
-        form = host::teststand::loadFormJson(
+        for (const std::string& c : teststand::jobStatusCaptions()) list += (list.empty() ? "\"" : ", \"") + c + "\"";
+        form = teststand::loadFormJson(
             "{\"dtpFromDate\": \"2026-03-01\", \"dtpToDate\": \"2026-05-12\", \"cboFields\": {\"1\": [" + list + "]}}",
             "bench form");
         setUiServices(std::make_unique<HeadlessUi>());

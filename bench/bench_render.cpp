@@ -12,7 +12,7 @@
 #include <QTemporaryDir>
 #include <string>
 
-#include "bench/BenchCharts.h"
+#include "BenchCharts.h"
 #include "chart/control/model/ChartControl.h"
 #include "chart/control/render/ChartExport.h"
 #include "chart/control/render/PngWriter.h"

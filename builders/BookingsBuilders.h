@@ -5,11 +5,18 @@
 #include <cstdint>
 #include <string>
 
+#include "builders/BuildContext.h"
+
 namespace kg::builders {
 
 // One measure as one series, no legend.
-void DrawBookingsGraph(const std::string& sHeader, const std::string& sYTitle, const int32_t& lMeasureCol);
+void DrawBookingsGraph(BuildContext& context, const std::string& header, const std::string& yTitle,
+                       int32_t measureColumn);
 // Two measures side by side, with the grid's captions of the two columns in the legend.
-void DrawBookingsDualGraph(const std::string& sHeader, const int32_t& lMeasureCol1, const int32_t& lMeasureCol2);
+void DrawBookingsDualGraph(BuildContext& context, const std::string& header, int32_t measureColumn1,
+                           int32_t measureColumn2);
+
+// "DD/MM/YYYY - DD/MM/YYYY" of the source form's two date pickers.
+std::string dateRange(const Variant& sourceForm);
 
 }  // namespace kg::builders

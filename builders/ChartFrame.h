@@ -6,8 +6,7 @@
 #include <functional>
 #include <string>
 
-#include "chart/ChartWindowPort.h"
-#include "chart/c2dChart.h"
+#include "builders/BuildContext.h"
 
 namespace kg::builders {
 
@@ -19,9 +18,9 @@ struct ChartFrame {
 
 // Points run from 1 to `lastPoint()`, asked of the grid only once the chart is initialised: the
 // host sees its calls in this order. The control's point labels are cleared for the builder.
-c2dChart& prepareChart(ChartWindowPort& window, const ChartFrame& frame, const std::function<int32_t()>& lastPoint);
+c2dChart& prepareChart(BuildContext& context, const ChartFrame& frame, const std::function<int32_t()>& lastPoint);
 
 // The pointer back, the window (with or without its Redraw command) shown, the table drawn.
-void showChart(ChartWindowPort& window, c2dChart& chart, bool redrawVisible);
+void showChart(BuildContext& context, bool redrawVisible);
 
 }  // namespace kg::builders

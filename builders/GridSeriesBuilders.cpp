@@ -2,12 +2,9 @@
 
 #include "builders/ChartFrame.h"
 #include "builders/LateBoundGrid.h"
-#include "component/modMain.h"
 #include "core/Convert.h"
 
 namespace kg::builders {
-
-using namespace modMain;
 
 namespace {
 
@@ -19,14 +16,13 @@ int32_t lastPoint(LateBoundGrid& grid, Points points)
     return points == Points::FromColumns ? toLong(Variant(double(grid.cols()) - 2)) : 12;
 }
 
-void drawGridSeries(const Variant& vGrid, const std::string& sHeader, const std::string& sYTitle,
-                    int32_t lNumSeries, Points points)
+void drawGridSeries(BuildContext& context, const GridChart& request, Points points)
 {
-    LateBoundGrid grid(vGrid);
-    HourglassOn();
-    ChartWindowPort& window = chartWindow();
-    c2dChart& c = prepareChart(window, {sHeader, "Month", sYTitle, lNumSeries, true},
-                               [&] { return lastPoint(grid, points); });
+    LateBoundGrid grid(request.grid);
+    context.hourglass(true);
+    ChartWindowPort& window = context.window();
+    prepareChart(context, {request.header, "Month", request.yTitle, request.numSeries, true},
+                 [&] { return lastPoint(grid, points); });
 
     control::ChartControl& chart1 = window.Chart1();
     chart1.group1.seriesLabels.clear();
@@ -38,34 +34,32 @@ void drawGridSeries(const Variant& vGrid, const std::string& sHeader, const std:
         chart1.group1.pointLabels.push_back(grid.textmatrix(0, col));
     chart1.chartArea.x.annotationMethod = 2;
 
+    VariantArray& table = context.table();
     const int32_t fixedRows = grid.FixedRows(), rows = grid.Rows();
     for (int32_t r = fixedRows; r < rows; ++r) {
         // Each row's values go to the series its caption names, however many caption rows there are.
         const int32_t series = r - fixedRows + 1;
         for (int32_t col = 1, last = lastPoint(grid, points); col <= last; ++col)
-            gvArray.at(series, col) = Variant(grid.textmatrix(r, col));
+            table.at(series, col) = Variant(grid.textmatrix(r, col));
     }
-    showChart(window, c, false);
+    showChart(context, false);
 }
 
 }  // namespace
 
-void DrawHourlyGraph(const Variant& vGrid, const std::string& sHeader, const std::string& sYTitle,
-                     const int32_t& lNumSeries)
+void DrawHourlyGraph(BuildContext& context, const GridChart& chart)
 {
-    drawGridSeries(vGrid, sHeader, sYTitle, lNumSeries, Points::FromColumns);
+    drawGridSeries(context, chart, Points::FromColumns);
 }
 
-void DrawPropGraph(const Variant& vGrid, const std::string& sHeader, const std::string& sYTitle,
-                   const int32_t& lNumSeries)
+void DrawPropGraph(BuildContext& context, const GridChart& chart)
 {
-    drawGridSeries(vGrid, sHeader, sYTitle, lNumSeries, Points::TwelveMonths);
+    drawGridSeries(context, chart, Points::TwelveMonths);
 }
 
-void DrawYearlyRpt(const Variant& vGrid, const std::string& sHeader, const std::string& sYTitle,
-                   const int32_t& lNumSeries)
+void DrawYearlyRpt(BuildContext& context, const GridChart& chart)
 {
-    drawGridSeries(vGrid, sHeader, sYTitle, lNumSeries, Points::TwelveMonths);
+    drawGridSeries(context, chart, Points::TwelveMonths);
 }
 
 }  // namespace kg::builders

@@ -6,15 +6,18 @@
 #include <cstdint>
 #include <string>
 
-#include "core/Variant.h"
+#include "builders/BuildContext.h"
 
 namespace kg::builders {
 
-void DrawHourlyGraph(const Variant& vGrid, const std::string& sHeader, const std::string& sYTitle,
-                     const int32_t& lNumSeries);
-void DrawPropGraph(const Variant& vGrid, const std::string& sHeader, const std::string& sYTitle,
-                   const int32_t& lNumSeries);
-void DrawYearlyRpt(const Variant& vGrid, const std::string& sHeader, const std::string& sYTitle,
-                   const int32_t& lNumSeries);
+struct GridChart {
+    Variant grid;
+    std::string header, yTitle;
+    int32_t numSeries = 0;
+};
+
+void DrawHourlyGraph(BuildContext& context, const GridChart& chart);
+void DrawPropGraph(BuildContext& context, const GridChart& chart);
+void DrawYearlyRpt(BuildContext& context, const GridChart& chart);
 
 }  // namespace kg::builders

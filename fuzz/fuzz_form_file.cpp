@@ -7,13 +7,13 @@
 #include <functional>
 
 #include "core/Convert.h"
-#include "fuzz/FuzzSupport.h"
-#include "host/TestStand.h"
+#include "FuzzSupport.h"
+#include "teststand/TestStand.h"
 
 using namespace kg;
 using kg::fuzz::expectOnly;
 using kg::fuzz::require;
-namespace stand = kg::host::teststand;
+namespace stand = kg::teststand;
 
 namespace {
 

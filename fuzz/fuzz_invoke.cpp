@@ -8,17 +8,17 @@
 #include <QTemporaryDir>
 #include <array>
 
-#include "component/HeadlessUi.h"
-#include "component/cTavixGraph.h"
-#include "component/modMain.h"
-#include "fuzz/FuzzSupport.h"
-#include "host/SampleJobs.h"
-#include "host/TestStand.h"
+#include "requests/HeadlessUi.h"
+#include "requests/cTavixGraph.h"
+#include "requests/modMain.h"
+#include "FuzzSupport.h"
+#include "teststand/SampleJobs.h"
+#include "teststand/TestStand.h"
 
 using namespace kg;
 using kg::fuzz::ByteReader;
 using kg::fuzz::require;
-namespace stand = kg::host::teststand;
+namespace stand = kg::teststand;
 
 namespace {
 

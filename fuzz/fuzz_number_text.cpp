@@ -12,7 +12,7 @@
 
 #include "core/Convert.h"
 #include "core/Date.h"
-#include "fuzz/FuzzSupport.h"
+#include "FuzzSupport.h"
 
 using namespace kg;
 using kg::fuzz::expectOnly;

@@ -5,7 +5,7 @@
 #include <cmath>
 
 #include "core/Convert.h"
-#include "fuzz/FuzzSupport.h"
+#include "FuzzSupport.h"
 
 using namespace kg;
 using kg::fuzz::expectOnly;

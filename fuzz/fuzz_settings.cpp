@@ -12,20 +12,20 @@
 #include <map>
 
 #include "chart/c2dChart.h"
-#include "component/modMain.h"
+#include "requests/modMain.h"
 #include "core/Convert.h"
-#include "fuzz/FuzzSupport.h"
-#include "host/RawIni.h"
-#include "host/SettingsFile.h"
-#include "host/TestStand.h"
+#include "FuzzSupport.h"
+#include "teststand/RawIni.h"
+#include "teststand/SettingsFile.h"
+#include "teststand/TestStand.h"
 #include "ui/NumericField.h"
 #include "ui/frmChartSetup.h"
 
 using namespace kg;
 using kg::fuzz::expectOnly;
 using kg::fuzz::require;
-namespace stand = kg::host::teststand;
-namespace rawini = kg::host::teststand::rawini;
+namespace stand = kg::teststand;
+namespace rawini = kg::teststand::rawini;
 
 namespace {
 

@@ -1,7 +1,5 @@
 #include "host/HostObjects.h"
 
-#include "host/TestStand.h"
-
 namespace kg::host {
 
 namespace {
@@ -23,11 +21,7 @@ const char* hostClassName(HostClass c)
     return "?";
 }
 
-Ref<HostObjectFactory> hostObjectFactory()
-{
-    if (!current()) current() = teststand::makeFactory();
-    return current();
-}
+Ref<HostObjectFactory> hostObjectFactory() { return current(); }
 
 void setHostObjectFactory(Ref<HostObjectFactory> factory) { current() = std::move(factory); }
 

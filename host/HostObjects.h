@@ -33,7 +33,8 @@ public:
     virtual Ref<Object> create(HostClass cls) = 0;
 };
 
-// The factory in use: the test stand's unless a host or a test installed another.
+// The factory in use, or null before a host installed one (the C surface installs the test
+// stand's when the host has none).
 Ref<HostObjectFactory> hostObjectFactory();
 void setHostObjectFactory(Ref<HostObjectFactory> factory);
 

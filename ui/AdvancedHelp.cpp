@@ -4,7 +4,7 @@
 #include <QProcess>
 #include <QStandardPaths>
 
-#include "component/modMain.h"
+#include "requests/modMain.h"
 #include "core/Convert.h"
 
 namespace kg::ui {

@@ -3,7 +3,7 @@
 // through the prompter, and the mouse pointer as the application's override cursor.
 #include <QPointer>
 
-#include "component/UiServices.h"
+#include "requests/UiServices.h"
 #include "ui/frmChart.h"
 
 namespace kg::ui {

@@ -4,7 +4,7 @@
 #include <QPointer>
 #include <QTextBrowser>
 
-#include "component/modMain.h"
+#include "requests/modMain.h"
 #include "core/Error.h"
 #include "ui/HelpText.h"
 #include "ui/Prompter.h"

@@ -9,7 +9,7 @@
 #include <cmath>
 #include <utility>
 
-#include "component/modMain.h"
+#include "requests/modMain.h"
 #include "core/Convert.h"
 #include "core/Error.h"
 #include "ui/NumericField.h"

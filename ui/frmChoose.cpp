@@ -7,7 +7,7 @@
 #include <QRadioButton>
 #include <QVBoxLayout>
 
-#include "component/modMain.h"
+#include "requests/modMain.h"
 #include "ui/WindowObject.h"
 
 namespace kg::ui {

@@ -4,7 +4,7 @@
 // -99, closing by the title bar leaves iChoice as it stands.
 #include <QDialog>
 
-#include "component/UiServices.h"
+#include "requests/UiServices.h"
 
 class QRadioButton;
 class QPushButton;

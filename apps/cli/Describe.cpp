@@ -6,8 +6,8 @@
 #include <string>
 
 #include "apps/cli/Commands.h"
-#include "component/Registration.h"
-#include "component/cTavixGraph.h"
+#include "capi/Registration.h"
+#include "requests/cTavixGraph.h"
 #include "core/Error.h"
 
 namespace {

@@ -13,8 +13,8 @@
 #include "core/Convert.h"
 #include "core/Error.h"
 #include "host/HostObjects.h"
-#include "host/SampleData.h"
-#include "host/TestStand.h"
+#include "teststand/SampleData.h"
+#include "teststand/TestStand.h"
 
 namespace {
 
@@ -34,7 +34,7 @@ struct Chart {
     Style style;
 };
 
-std::vector<Chart> galleryCharts(const kg::host::teststand::SampleTotals& totals)
+std::vector<Chart> galleryCharts(const kg::teststand::SampleTotals& totals)
 {
     std::vector<Chart> charts;
     auto grid = [&](const char* request, double total) {
@@ -69,7 +69,7 @@ void storeStyle(const Style& style)
     kg::Variant settings(kg::host::hostObjectFactory()->create(kg::host::HostClass::Settings));
     auto write = [&](const char* key, const std::string& value) {
         kg::Args a{kg::Variant("2dCharts"), kg::Variant(key), kg::Variant(value),
-                   kg::Variant(kg::host::teststand::config().settingsOwner), kg::Variant(std::string())};
+                   kg::Variant(kg::teststand::config().settingsOwner), kg::Variant(std::string())};
         kg::call(settings, "WriteSetting", a);
     };
     write("View3D", kg::numberText(style.view3D ? 1.0 : 0.0));
@@ -138,15 +138,15 @@ int runGallery(int argc, char** argv)
     char* qtArgv[] = {name, nullptr};
     QApplication app(qtArgc, qtArgv);
 
-    kg::host::teststand::SampleData sample;
+    kg::teststand::SampleData sample;
     kg::Ref<kg::Object> form;
     try {
-        sample = kg::host::teststand::writeSampleData(folder + "/sample");
-        auto& stand = kg::host::teststand::config();
+        sample = kg::teststand::writeSampleData(folder + "/sample");
+        auto& stand = kg::teststand::config();
         stand.settingsFile = folder + "/sample/settings.ini";
         QFile::remove(QString::fromStdString(stand.settingsFile));
         stand.jobsDatabase = sample.database;
-        form = kg::host::teststand::loadFormFile(sample.form);
+        form = kg::teststand::loadFormFile(sample.form);
     } catch (const kg::Error& e) {
         std::fprintf(stderr, "karstgraph gallery: %s\n", e.description().c_str());
         return 1;

@@ -10,11 +10,11 @@
 #include "apps/cli/Commands.h"
 #include "apps/cli/RequestRunner.h"
 #include "chart/control/render/ChartExport.h"
-#include "component/UiServices.h"
+#include "requests/UiServices.h"
 #include "core/Convert.h"
 #include "core/Error.h"
-#include "host/FaultPlan.h"
-#include "host/TestStand.h"
+#include "teststand/FaultPlan.h"
+#include "teststand/TestStand.h"
 
 namespace {
 
@@ -147,19 +147,19 @@ int runRender(int argc, char** argv)
     char* qtArgv[] = {name, nullptr};
     QApplication app(qtArgc, qtArgv);
 
-    auto& stand = kg::host::teststand::config();
+    auto& stand = kg::teststand::config();
     if (!o.settings.empty()) stand.settingsFile = o.settings;
     kg::Ref<kg::Object> form;
     try {
-        form = kg::host::teststand::loadFormFile(o.form);
+        form = kg::teststand::loadFormFile(o.form);
     } catch (const kg::Error& e) {
         std::fprintf(stderr, "karstgraph render: %s\n", e.description().c_str());
         return kUsage;
     }
-    stand.jobsDatabase = !o.jobs.empty() ? o.jobs : kg::host::teststand::jobsDatabaseOf(form);
+    stand.jobsDatabase = !o.jobs.empty() ? o.jobs : kg::teststand::jobsDatabaseOf(form);
 
     kg::cli::installOffscreenComponent();
-    for (const PlannedFailure& f : o.failures) kg::host::teststand::FaultPlan::failOn(f.operation, f.call);
+    for (const PlannedFailure& f : o.failures) kg::teststand::FaultPlan::failOn(f.operation, f.call);
     const kg::cli::RequestResult result = kg::cli::runRequest(kg::Variant(form), o.call);
     struct Shutdown {
         ~Shutdown() { kg::cli::shutdownComponent(); }

@@ -8,10 +8,12 @@
 #include <cstring>
 
 #include "chart/control/render/ChartExport.h"
-#include "component/cTavixGraph.h"
-#include "component/modMain.h"
+#include "requests/cTavixGraph.h"
+#include "requests/modMain.h"
 #include "core/Convert.h"
 #include "core/Error.h"
+#include "host/HostObjects.h"
+#include "teststand/TestStand.h"
 #include "ui/Prompter.h"
 #include "ui/QtUi.h"
 #include "ui/frmChoose.h"
@@ -55,6 +57,7 @@ const char* gridOf(const std::string& request)
 void installOffscreenComponent()
 {
     ui::installQtUi();
+    host::setHostObjectFactory(teststand::makeFactory());
     auto prompter = std::make_unique<ui::ScriptedPrompter>();
     g_prompter = prompter.get();
     ui::setPrompter(std::move(prompter));

@@ -15,7 +15,7 @@
 #include "apps/demo/FormObjects.h"
 #include "apps/demo/ReportForm.h"
 #include "core/Error.h"
-#include "host/SampleData.h"
+#include "teststand/SampleData.h"
 
 namespace kg::demo {
 
@@ -109,7 +109,7 @@ bool DemoWindow::loadSample()
 {
     QString why;
     try {
-        const host::teststand::SampleData sample = host::teststand::writeSampleData(options_.sampleFolder.toStdString());
+        const teststand::SampleData sample = teststand::writeSampleData(options_.sampleFolder.toStdString());
         sampleDatabase_ = QString::fromStdString(sample.database);
         ReportData data;
         if (loadReportData(QString::fromStdString(sample.form), data, why)) {

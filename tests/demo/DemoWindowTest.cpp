@@ -10,7 +10,7 @@
 #include "DemoSupport.h"
 #include "apps/demo/DemoWindow.h"
 #include "apps/demo/ReportForm.h"
-#include "host/SampleData.h"
+#include "teststand/SampleData.h"
 
 namespace {
 
@@ -153,8 +153,8 @@ INSTANTIATE_TEST_SUITE_P(Grids, HostGridFailureTest, ::testing::ValuesIn(kFailur
 
 TEST_F(DemoWindowTest, TotalsOnTheScreenAreTheSamplesTotals)
 {
-    const kg::host::teststand::SampleData sample =
-        kg::host::teststand::writeSampleData((scratch().path() + "/sample-check").toStdString());
+    const kg::teststand::SampleData sample =
+        kg::teststand::writeSampleData((scratch().path() + "/sample-check").toStdString());
     const kg::demo::ReportTotals shown = window->form()->totals();
     EXPECT_NEAR(shown.quantity, sample.totals.quantity, 0.005);
     EXPECT_NEAR(shown.value, sample.totals.value, 0.005);

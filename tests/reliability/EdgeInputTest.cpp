@@ -21,7 +21,7 @@
 namespace kg {
 namespace {
 
-namespace stand = host::teststand;
+namespace stand = teststand;
 
 constexpr DispId kYearly1 = 0x60030009, kProp1 = 0x60030011, kHourly1 = 0x60030014;
 constexpr DispId kBookings = 0x6003000C, kJobStatus = 0x6003000E;

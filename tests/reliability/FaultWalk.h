@@ -16,12 +16,12 @@
 #include <string>
 #include <vector>
 
-#include "host/FaultPlan.h"
-#include "host/RawIni.h"
+#include "teststand/FaultPlan.h"
+#include "teststand/RawIni.h"
 
 namespace kg::test {
 
-// Every operation the test stand asks the fault plan about (host/FaultPlan.h): the creation of
+// Every operation the test stand asks the fault plan about (teststand/FaultPlan.h): the creation of
 // the host library objects, their members, and the source form's members, grids, pickers and lists.
 inline const std::vector<std::string>& plannedOperations()
 {
@@ -58,7 +58,7 @@ inline std::vector<FailurePoint> countFailurePoints(const std::function<void()>&
                                                    const std::function<std::string()>& run,
                                                    std::vector<std::string>* reached = nullptr)
 {
-    using host::teststand::FaultPlan;
+    using teststand::FaultPlan;
     FaultPlan::clear();
     prepare();
     for (const std::string& op : plannedOperations()) FaultPlan::failOn(op, INT_MAX);
@@ -80,13 +80,13 @@ inline QByteArray fileBytes(const QString& path)
     return f.open(QIODevice::ReadOnly) ? f.readAll() : QByteArray();
 }
 
-inline host::teststand::rawini::Entries iniEntries(const QByteArray& text)
+inline teststand::rawini::Entries iniEntries(const QByteArray& text)
 {
     QBuffer b;
     b.setData(text);
     b.open(QIODevice::ReadOnly);
-    host::teststand::rawini::Entries entries;
-    host::teststand::rawini::readFile(b, entries);
+    teststand::rawini::Entries entries;
+    teststand::rawini::readFile(b, entries);
     return entries;
 }
 

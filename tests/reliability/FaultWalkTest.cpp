@@ -5,14 +5,14 @@
 #include <QFile>
 #include <cstdio>
 
-#include "host/SampleJobs.h"
+#include "teststand/SampleJobs.h"
 #include "reliability/FaultWalk.h"
 #include "support/RequestFixture.h"
 
 namespace kg {
 namespace {
 
-namespace stand = host::teststand;
+namespace stand = teststand;
 using stand::FaultPlan;
 
 constexpr int32_t kInjected = errc::HostBase + stand::hosterr::Injected;

@@ -12,7 +12,7 @@
 namespace kg {
 namespace {
 
-namespace stand = host::teststand;
+namespace stand = teststand;
 
 class SettingsStore : public test::RequestFixture {
 protected:

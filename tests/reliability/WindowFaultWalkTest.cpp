@@ -15,7 +15,7 @@
 #include <sys/resource.h>
 
 #include "chart/control/render/ChartPrinting.h"
-#include "host/SettingsFile.h"
+#include "teststand/SettingsFile.h"
 #include "reliability/FaultWalk.h"
 #include "support/RequestFixture.h"
 #include "ui/NumericField.h"
@@ -27,7 +27,7 @@
 namespace kg {
 namespace {
 
-namespace stand = host::teststand;
+namespace stand = teststand;
 using stand::FaultPlan;
 
 constexpr DispId kHourly1 = 0x60030014, kBookings = 0x6003000C;

@@ -8,11 +8,11 @@
 #include <QTemporaryDir>
 #include <string>
 
-#include "component/HeadlessUi.h"
-#include "component/cTavixGraph.h"
-#include "component/modMain.h"
+#include "requests/HeadlessUi.h"
+#include "requests/cTavixGraph.h"
+#include "requests/modMain.h"
 #include "core/Error.h"
-#include "host/TestStand.h"
+#include "teststand/TestStand.h"
 
 namespace kg::test {
 
@@ -26,7 +26,8 @@ struct RequestFixture : ::testing::Test {
         auto headless = std::make_unique<HeadlessUi>();
         ui = headless.get();
         setUiServices(std::move(headless));
-        auto& cfg = host::teststand::config();
+        host::setHostObjectFactory(teststand::makeFactory());
+        auto& cfg = teststand::config();
         cfg = {};
         cfg.settingsFile = dir.filePath("settings.ini").toStdString();
         cfg.appFolder = dir.path().toStdString();
@@ -39,6 +40,7 @@ struct RequestFixture : ::testing::Test {
         modMain::releaseSharedObjects();
         modMain::gvSourceForm = Variant();
         setUiServices(nullptr);
+        host::setHostObjectFactory(nullptr);
     }
 
     void writeSetting(const std::string& key, const std::string& value)
@@ -49,7 +51,7 @@ struct RequestFixture : ::testing::Test {
     }
     void setForm(const std::string& json)
     {
-        Args a{Variant(host::teststand::loadFormJson(json, "test form"))};
+        Args a{Variant(teststand::loadFormJson(json, "test form"))};
         graph->invoke(0x68030008, kPropertyPut, a);
     }
     // Invokes by dispatch id; returns the error number (0 on success).

@@ -17,12 +17,12 @@ struct AdvancedHelpFixture : UiFixture {
     void SetUp() override
     {
         UiFixture::SetUp();
-        host::teststand::setShellErrorReporter([this](int32_t code, const std::string&) { reported.push_back(code); });
+        teststand::setShellErrorReporter([this](int32_t code, const std::string&) { reported.push_back(code); });
     }
     void TearDown() override
     {
         ui::setHelpOpener({});
-        host::teststand::setShellErrorReporter({});
+        teststand::setShellErrorReporter({});
         UiFixture::TearDown();
     }
     // Puts a help file into an application folder, by default the fixture's temporary folder.
@@ -94,7 +94,7 @@ TEST_P(DesktopOpener, GivesShellStyleCodes)
     ui::openAdvancedHelp();
     EXPECT_EQ(reported, c.expected < 32 ? std::vector<int32_t>{c.expected} : std::vector<int32_t>{});
     if (c.expected < 32) {
-        EXPECT_EQ(host::teststand::lastShellError(), c.expected);
+        EXPECT_EQ(teststand::lastShellError(), c.expected);
     }
 }
 
@@ -105,7 +105,7 @@ TEST_F(AdvancedHelpFixture, OpenerGetsThePathAsOneArgumentWithoutAShell)
     // An application folder whose name a shell would split and expand.
     const QString folder = dir.filePath("Tavix $HOME 'x' ; y");
     writeHelpFile(folder);
-    host::teststand::config().appFolder = folder.toStdString();
+    teststand::config().appFolder = folder.toStdString();
     modMain::GraphInitialize();
 
     // A stand-in opener that writes down its arguments.

@@ -5,8 +5,8 @@
 #include <optional>
 #include <string>
 
-#include "host/FaultPlan.h"
-#include "host/SettingsFile.h"
+#include "teststand/FaultPlan.h"
+#include "teststand/SettingsFile.h"
 #include "support/RequestFixture.h"
 #include "ui/UiSupport.h"
 #include "ui/Prompter.h"
@@ -27,7 +27,7 @@ struct UiFixture : RequestFixture {
     }
     void TearDown() override
     {
-        host::teststand::FaultPlan::clear();
+        teststand::FaultPlan::clear();
         ui::setPrompter(std::make_unique<ui::QtPrompter>());
         RequestFixture::TearDown();
     }
@@ -43,9 +43,9 @@ struct UiFixture : RequestFixture {
     {
         return settingsFile().read("FormState/" + windowKey + "/" + member);
     }
-    host::teststand::SettingsFile settingsFile() const
+    teststand::SettingsFile settingsFile() const
     {
-        return host::teststand::SettingsFile(host::teststand::config().settingsFile);
+        return teststand::SettingsFile(teststand::config().settingsFile);
     }
 };
 

@@ -26,7 +26,7 @@ struct HelpFixture : UiFixture {
     {
         UiFixture::SetUp();
         eventLog = dir.filePath("events.log");
-        host::teststand::config().eventLogFile = eventLog.toStdString();
+        teststand::config().eventLogFile = eventLog.toStdString();
         modMain::GraphInitialize();  // application services that write the event log
     }
     void TearDown() override
@@ -210,7 +210,7 @@ TEST_F(HelpFixture, ClosingAfterTheChartWindowReleasedTheHostObjectsIsQuiet)
 TEST_F(HelpFixture, FailingSaveIsReportedAndTheWindowStillCloses)
 {
     showChartHelp();
-    host::teststand::FaultPlan::failOn("AppServices.SaveFormState", 1);
+    teststand::FaultPlan::failOn("AppServices.SaveFormState", 1);
     closeHelp();
     EXPECT_EQ(chartHelpWindow(), nullptr);
     ASSERT_EQ(prompts->messages.size(), 1u);
@@ -219,7 +219,7 @@ TEST_F(HelpFixture, FailingSaveIsReportedAndTheWindowStillCloses)
 
 TEST_F(HelpFixture, FailingLoadLeavesNoWindow)
 {
-    host::teststand::FaultPlan::failOn("AppServices.RestoreFormState", 1);
+    teststand::FaultPlan::failOn("AppServices.RestoreFormState", 1);
     EXPECT_THROW(showChartHelp(), Error);
     EXPECT_EQ(chartHelpWindow(), nullptr);
 }

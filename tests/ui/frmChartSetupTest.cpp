@@ -369,13 +369,13 @@ INSTANTIATE_TEST_SUITE_P(ChartSetup, Close, ::testing::ValuesIn(kCloses), byName
 
 TEST_F(SetupFixture, FailingWriteEndsOkAndLeavesShowChartSetupWithTheError)
 {
-    host::teststand::FaultPlan::failOn("Settings.WriteSetting", 3);  // Elevation
+    teststand::FaultPlan::failOn("Settings.WriteSetting", 3);  // Elevation
     bool stillOpen = true;
     prompts->answers.push_back([&](QDialog& d) {
         work(dynamic_cast<frmChartSetup&>(d), "3d ok");
         stillOpen = d.isVisible();
     });
-    EXPECT_EQ(errorNumberOf(ui::showChartSetup), errc::HostBase + host::teststand::hosterr::Injected);
+    EXPECT_EQ(errorNumberOf(ui::showChartSetup), errc::HostBase + teststand::hosterr::Injected);
     EXPECT_FALSE(stillOpen);
     // What was stored before the failure stays; nothing after it is stored or applied.
     EXPECT_EQ(storedStyle("View3D"), " 0");

@@ -13,7 +13,7 @@
 
 #include "chart/control/render/ChartPrinting.h"
 #include "chart/control/view/ChartView.h"
-#include "component/Requests.h"
+#include "requests/Requests.h"
 #include "ui/QtUi.h"
 #include "ui/frmChartSetup.h"
 #include "ui/frmChoose.h"
@@ -37,7 +37,7 @@ struct WindowFixture : test::RequestFixture {
         auto scripted = std::make_unique<ui::ScriptedPrompter>();
         prompts = scripted.get();
         ui::setPrompter(std::move(scripted));
-        host::teststand::config().eventLogFile = dir.filePath("events.log").toStdString();
+        teststand::config().eventLogFile = dir.filePath("events.log").toStdString();
     }
     void TearDown() override
     {
