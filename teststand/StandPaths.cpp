@@ -44,7 +44,8 @@ std::string appFolderPath(const Config& cfg)
     if (std::string folder = env("KARSTGRAPH_APPFOLDER"); !folder.empty()) return withoutTrailingSeparator(folder);
     const fs::path exeDir = executableFolder();
     for (const fs::path& candidate :
-         {exeDir, exeDir.parent_path(), fs::path("/usr/share/karstgraph"), fs::path("/usr/local/share/karstgraph")}) {
+         {exeDir, exeDir.parent_path(), exeDir.parent_path() / "share" / "karstgraph",
+          fs::path("/usr/share/karstgraph"), fs::path("/usr/local/share/karstgraph")}) {
         std::error_code ec;
         if (fs::is_directory(candidate / "Help", ec)) return withoutTrailingSeparator(candidate.lexically_normal().string());
     }

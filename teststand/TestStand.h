@@ -46,7 +46,8 @@ std::string jobsDatabaseOf(const Ref<Object>& form);
 // settings: cfg.settingsFile, else $KARSTGRAPH_SETTINGS, else $XDG_CONFIG_HOME (or ~/.config)
 //   followed by /karstgraph/settings.ini;
 // application folder: cfg.appFolder, else $KARSTGRAPH_APPFOLDER, else the first of <exe dir>,
-//   <exe dir>/.., /usr/share/karstgraph, /usr/local/share/karstgraph that holds Help/
+//   <exe dir>/.., <exe dir>/../share/karstgraph (an installed tree), /usr/share/karstgraph,
+//   /usr/local/share/karstgraph that holds Help/
 //   (the executable's folder when none does). No trailing separator.
 std::string settingsFilePath(const Config& cfg);
 std::string appFolderPath(const Config& cfg);
