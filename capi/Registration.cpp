@@ -1,123 +1,42 @@
 #include "capi/Registration.h"
 
-#include <unistd.h>
-
-#include <cctype>
-#include <string_view>
-#include <vector>
-
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
-#include <QSaveFile>
 
 #include "core/Error.h"
+#include "files/IniDocument.h"
+#include "files/WholeFile.h"
 
 namespace kg::registration {
 
 namespace {
 
-// The file as sections of raw lines, so that entries of others survive a rewrite as they were.
-struct Section {
-    std::string name;                // between the brackets; empty for the lines before the first section
-    std::vector<std::string> lines;  // the header line (if any) and the lines up to the next section
-};
-using Document = std::vector<Section>;
-
-std::string trimmed(std::string_view s)
-{
-    size_t b = 0, e = s.size();
-    while (b < e && std::isspace(static_cast<unsigned char>(s[b]))) ++b;
-    while (e > b && std::isspace(static_cast<unsigned char>(s[e - 1]))) --e;
-    return std::string(s.substr(b, e - b));
-}
-
-std::optional<std::string> sectionNameOf(const std::string& line)
-{
-    const std::string t = trimmed(line);
-    if (t.size() < 2 || t.front() != '[' || t.back() != ']') return std::nullopt;
-    return trimmed(std::string_view(t).substr(1, t.size() - 2));
-}
-
-Document parse(const QByteArray& text)
-{
-    Document doc(1);
-    size_t start = 0;
-    const std::string all = text.toStdString();
-    while (start < all.size()) {
-        size_t end = all.find('\n', start);
-        if (end == std::string::npos) end = all.size();
-        std::string line = all.substr(start, end - start);
-        if (!line.empty() && line.back() == '\r') line.pop_back();
-        start = end + 1;
-        if (auto name = sectionNameOf(line)) doc.push_back({*name, {}});
-        doc.back().lines.push_back(std::move(line));
-    }
-    return doc;
-}
-
-QByteArray serialize(const Document& doc)
-{
-    std::string out;
-    for (const Section& s : doc)
-        for (const std::string& line : s.lines) out += line + "\n";
-    return QByteArray::fromStdString(out);
-}
-
-Section* find(Document& doc, std::string_view name)
-{
-    for (size_t i = 1; i < doc.size(); ++i)
-        if (equalsNoCase(doc[i].name, name)) return &doc[i];
-    return nullptr;
-}
-
-std::optional<std::string> valueOf(const Section& s, std::string_view key)
-{
-    for (size_t i = 1; i < s.lines.size(); ++i) {
-        const std::string& line = s.lines[i];
-        const size_t eq = line.find('=');
-        if (eq != std::string::npos && equalsNoCase(trimmed(std::string_view(line).substr(0, eq)), key))
-            return trimmed(std::string_view(line).substr(eq + 1));
-    }
-    return std::nullopt;
-}
-
-bool isComment(const std::string& line)
-{
-    const std::string t = trimmed(line);
-    return !t.empty() && (t.front() == ';' || t.front() == '#');
-}
-
-// Drops section i but not the comments in it: they may well introduce the section that follows.
-void removeSection(Document& doc, size_t i)
-{
-    for (const std::string& line : doc[i].lines)
-        if (isComment(line)) doc[i - 1].lines.push_back(line);
-    doc.erase(doc.begin() + static_cast<std::ptrdiff_t>(i));
-}
+using files::IniDocument;
 
 // Our section in place of an older one of the same name (duplicates dropped), else at the end.
-void replaceOrAppend(Document& doc, Section ours)
+void replaceOrAppend(IniDocument& doc, IniDocument::Section ours)
 {
-    ours.lines.emplace_back();  // a blank line keeps the sections apart
+    ours.appendBlank();  // a blank line keeps the sections apart
     bool placed = false;
-    for (size_t i = 1; i < doc.size();) {
-        if (!equalsNoCase(doc[i].name, ours.name)) {
+    auto& sections = doc.sections();
+    for (size_t i = 1; i < sections.size();) {
+        if (!equalsNoCase(sections[i].name.toStdString(), ours.name.toStdString())) {
             ++i;
         } else if (!placed) {
-            for (const std::string& line : doc[i].lines)
-                if (isComment(line)) ours.lines.push_back(line);
-            doc[i] = ours;
+            for (const IniDocument::Line& line : sections[i].lines)
+                if (doc.isComment(line)) ours.lines.push_back(line);
+            sections[i] = ours;
             placed = true;
             ++i;
         } else {
-            removeSection(doc, i);
+            doc.removeSection(i);
         }
     }
     if (placed) return;
-    const Section& last = doc.back();
-    if (!last.lines.empty() && !trimmed(last.lines.back()).empty()) doc.back().lines.emplace_back();
-    doc.push_back(std::move(ours));
+    const IniDocument::Section& last = sections.back();
+    if (!last.lines.empty() && !last.lines.back().text.trimmed().isEmpty()) sections.back().appendBlank();
+    sections.push_back(std::move(ours));
 }
 
 Error accessError(const std::string& file, const std::string& what)
@@ -125,36 +44,43 @@ Error accessError(const std::string& file, const std::string& what)
     return Error(errc::PathFileAccess, "Path/File access error: registration file \"" + file + "\" " + what);
 }
 
-Document read(const std::string& file)
+IniDocument read(const std::string& file)
 {
     QFile f(QString::fromStdString(file));
-    if (!f.exists()) return Document(1);
+    if (!f.exists()) return IniDocument(IniDocument::Syntax::Lines);
     if (!f.open(QIODevice::ReadOnly)) throw accessError(file, "cannot be read: " + f.errorString().toStdString());
     const QByteArray text = f.readAll();
     if (f.error() != QFileDevice::NoError)
         throw accessError(file, "cannot be read: " + f.errorString().toStdString());
-    return parse(text);
+    return IniDocument::parse(text, IniDocument::Syntax::Lines);
 }
 
-// A temporary file next to the old one, synced, then renamed over it: readers see the old file or
-// the new one, never a part.
-void write(const std::string& file, const Document& doc)
+// Synced to disk before it replaces the old file: readers see the old file or the new one, never a
+// part, also after a power cut.
+void write(const std::string& file, const IniDocument& doc)
 {
     const QString path = QString::fromStdString(file);
     const QString folder = QFileInfo(path).absolutePath();
     if (!QDir().mkpath(folder))
         throw accessError(file, "cannot be written: its folder \"" + folder.toStdString() + "\" cannot be created");
-    QSaveFile f(path);
-    const auto fail = [&](const std::string& step) {
-        const std::string reason = f.errorString().toStdString();
-        f.cancelWriting();
-        return accessError(file, "cannot be written (" + step + "): " + reason);
-    };
-    if (!f.open(QIODevice::WriteOnly)) throw fail("open");
-    const QByteArray bytes = serialize(doc);
-    if (f.write(bytes) != bytes.size() || !f.flush()) throw fail("write");
-    if (::fsync(f.handle()) != 0) throw fail("sync");
-    if (!f.commit()) throw accessError(file, "cannot be written (rename): " + f.errorString().toStdString());
+    static const char* const steps[] = {"open", "write", "sync", "rename"};  // by WriteFailure::Step
+    if (const auto failed = files::writeWholeFile(path, doc.serialize(), files::Sync::ToDisk))
+        throw accessError(file, std::string("cannot be written (") + steps[failed->step] +
+                                    "): " + failed->reason.toStdString());
+}
+
+IniDocument::Section section(const std::string& name, std::initializer_list<std::pair<std::string, std::string>> entries)
+{
+    IniDocument::Section s{QByteArray::fromStdString(name), {{QByteArray::fromStdString("[" + name + "]"), -1}}};
+    for (const auto& [key, value] : entries) s.append(QByteArray::fromStdString(key), QByteArray::fromStdString(value));
+    return s;
+}
+
+std::optional<std::string> valueOf(const IniDocument& doc, const IniDocument::Section& s, const char* key)
+{
+    const std::optional<QByteArray> value = doc.value(s, key);
+    if (!value) return std::nullopt;
+    return value->toStdString();
 }
 
 std::string classSectionName(const Guid& clsid) { return "CLSID\\" + guidText(clsid); }
@@ -184,53 +110,53 @@ void registerServer(const std::string& libraryPath, const std::string& file)
 {
     if (libraryPath.empty() || libraryPath.front() != '/' || libraryPath.find_first_of("\r\n") != std::string::npos)
         throw Error::invalidCall("the library to register must be one absolute path, not \"" + libraryPath + "\"");
-    Document doc = read(file);
-    replaceOrAppend(doc, {classSectionName(kClsidTavixGraph),
-                          {"[" + classSectionName(kClsidTavixGraph) + "]", std::string("ProgID=") + kProgId,
-                           "InprocServer=" + libraryPath,
-                           std::string("Interface=") + kInterfaceName + " " + guidText(kIidTavixGraph)}});
-    replaceOrAppend(doc, {progIdSectionName(kProgId),
-                          {"[" + progIdSectionName(kProgId) + "]", "CLSID=" + guidText(kClsidTavixGraph)}});
+    IniDocument doc = read(file);
+    replaceOrAppend(doc, section(classSectionName(kClsidTavixGraph),
+                                 {{"ProgID", kProgId},
+                                  {"InprocServer", libraryPath},
+                                  {"Interface", std::string(kInterfaceName) + " " + guidText(kIidTavixGraph)}}));
+    replaceOrAppend(doc, section(progIdSectionName(kProgId), {{"CLSID", guidText(kClsidTavixGraph)}}));
     write(file, doc);
 }
 
 void unregisterServer(const std::string& file)
 {
-    Document doc = read(file);
-    const size_t before = doc.size();
+    IniDocument doc = read(file);
+    auto& sections = doc.sections();
+    const size_t before = sections.size();
     const std::string ourClass = classSectionName(kClsidTavixGraph);
     const std::string ourProgId = progIdSectionName(kProgId);
-    for (size_t i = 1; i < doc.size();) {
-        const Section& s = doc[i];
-        bool ours = equalsNoCase(s.name, ourClass);
+    for (size_t i = 1; i < sections.size();) {
+        const IniDocument::Section& s = sections[i];
+        bool ours = equalsNoCase(s.name.toStdString(), ourClass);
         // The programmatic name may meanwhile belong to another class: then it is not ours to remove.
-        if (!ours && equalsNoCase(s.name, ourProgId)) {
-            const std::optional<std::string> clsid = valueOf(s, "CLSID");
+        if (!ours && equalsNoCase(s.name.toStdString(), ourProgId)) {
+            const std::optional<std::string> clsid = valueOf(doc, s, "CLSID");
             const std::optional<Guid> g = clsid ? parseGuid(*clsid) : std::nullopt;
             ours = g && *g == kClsidTavixGraph;
         }
         if (ours)
-            removeSection(doc, i);
+            doc.removeSection(i);
         else
             ++i;
     }
-    if (doc.size() != before) write(file, doc);
+    if (sections.size() != before) write(file, doc);
 }
 
 std::optional<ClassRegistration> findProgId(const std::string& progId, const std::string& file)
 {
-    Document doc = read(file);
-    const Section* prog = find(doc, progIdSectionName(progId));
+    IniDocument doc = read(file);
+    const IniDocument::Section* prog = doc.find(QByteArray::fromStdString(progIdSectionName(progId)));
     if (!prog) return std::nullopt;
-    const std::optional<std::string> clsidText = valueOf(*prog, "CLSID");
+    const std::optional<std::string> clsidText = valueOf(doc, *prog, "CLSID");
     if (!clsidText) return std::nullopt;
     const std::optional<Guid> clsid = parseGuid(*clsidText);
     if (!clsid)
-        throw Error::typeMismatch("registration file \"" + file + "\": [" + prog->name + "] CLSID=" + *clsidText +
+        throw Error::typeMismatch("registration file \"" + file + "\": [" + prog->name.toStdString() + "] CLSID=" + *clsidText +
                                   " is not a class id");
-    const Section* cls = find(doc, classSectionName(*clsid));
+    const IniDocument::Section* cls = doc.find(QByteArray::fromStdString(classSectionName(*clsid)));
     if (!cls) return std::nullopt;
-    const std::optional<std::string> library = valueOf(*cls, "InprocServer");
+    const std::optional<std::string> library = valueOf(doc, *cls, "InprocServer");
     if (!library || library->empty()) return std::nullopt;
     return ClassRegistration{*clsid, *library};
 }

@@ -4,7 +4,6 @@
 // control knows and 3-D angles the dialog can show; writing a file keeps every other entry as it
 // was read (the reader and the writer agree on every text).
 #include <QApplication>
-#include <QBuffer>
 #include <QDir>
 #include <QFile>
 #include <QTemporaryDir>
@@ -52,27 +51,16 @@ std::map<std::string, std::string> asTexts(const rawini::Entries& entries)
 // The writer and the reader agree: what is read from a file, written and read again is the same.
 void checkRoundTrip(const QByteArray& text)
 {
-    QBuffer in;
-    in.setData(text);
-    in.open(QIODevice::ReadOnly);
-    rawini::Entries entries;
-    require(rawini::readFile(in, entries), "readFile refused a buffer");
-    QBuffer out;
-    out.open(QIODevice::WriteOnly);
-    require(rawini::writeFile(out, entries), "writeFile failed on a buffer");
-    QBuffer again;
-    again.setData(out.data());
-    again.open(QIODevice::ReadOnly);
-    rawini::Entries backEntries;
-    rawini::readFile(again, backEntries);
-    const auto read = asTexts(entries), back = asTexts(backEntries);
+    const rawini::Entries entries = rawini::entriesOf(text);
+    const QByteArray written = rawini::fileTextOf(entries);
+    const auto read = asTexts(entries), back = asTexts(rawini::entriesOf(written));
     if (back == read) return;
     for (const auto& [key, value] : read) {
         const auto b = back.find(key);
-        require(b != back.end(), "the entry \"" + key + "\" is lost by a write; written:\n" + out.data().toStdString());
+        require(b != back.end(), "the entry \"" + key + "\" is lost by a write; written:\n" + written.toStdString());
         require(b->second == value, "the entry \"" + key + "\" = \"" + value + "\" reads back as \"" + b->second + "\"");
     }
-    kg::fuzz::fail("a write adds entries; written:\n" + out.data().toStdString());
+    kg::fuzz::fail("a write adds entries; written:\n" + written.toStdString());
 }
 
 bool knownChartType(int16_t t)

@@ -1,69 +1,15 @@
 #include "teststand/RawIni.h"
 
-#include <QIODevice>
 #include <QStringDecoder>
+
+#include "files/IniDocument.h"
 
 namespace kg::teststand::rawini {
 
 namespace {
 
-bool isBlank(char c) { return c == ' ' || c == '\t' || c == '\n' || c == '\r'; }
-bool isSpecial(char c) { return c == '\n' || c == '\r' || c == '"' || c == ';' || c == '=' || c == '\\'; }
 bool isHexDigit(char c) { return (c >= '0' && c <= '9') || (c >= 'a' && c <= 'f') || (c >= 'A' && c <= 'F'); }
 int hexValue(char c) { return c <= '9' ? c - '0' : (c | 0x20) - 'a' + 10; }
-
-
-struct Line {
-    int start = 0;
-    int length = 0;
-    int equals = -1;  // position of the first = outside quotes, or -1
-};
-
-// One logical line, as IniFormat reads it: a quoted value or an escaped line end continues the
-// line, a ; outside quotes starts a comment, blank lines are skipped.
-bool nextLine(const QByteArray& data, int& pos, Line& line)
-{
-    const int n = static_cast<int>(data.size());
-    bool inQuotes = false;
-    line.equals = -1;
-    int start = pos;
-    while (start < n && isBlank(data[start])) ++start;
-    int i = start;
-    while (i < n) {
-        const char ch = data[i++];
-        if (!isSpecial(ch)) continue;
-        if (ch == '=') {
-            if (!inQuotes && line.equals == -1) line.equals = i - 1;
-        } else if (ch == '\n' || ch == '\r') {
-            if (i == start + 1) {
-                ++start;
-            } else if (!inQuotes) {
-                --i;
-                break;
-            }
-        } else if (ch == '\\') {
-            if (i < n) {
-                const char escaped = data[i++];
-                if (i < n) {
-                    const char next = data[i];
-                    if ((escaped == '\n' && next == '\r') || (escaped == '\r' && next == '\n')) ++i;
-                }
-            }
-        } else if (ch == '"') {
-            inQuotes = !inQuotes;
-        } else if (i == start + 1) {  // ';' opening the line: a comment line
-            while (i < n && data[i] != '\n' && data[i] != '\r') ++i;
-            start = i;
-        } else if (!inQuotes) {  // ';' after a value: the rest of the line is a comment
-            --i;
-            break;
-        }
-    }
-    pos = i;
-    line.start = start;
-    line.length = i - start;
-    return line.length > 0;
-}
 
 // Keys as IniFormat looks them up: parts joined by single slashes.
 QString normalizedKey(const QString& key)
@@ -264,65 +210,57 @@ QString unescapeKey(const QByteArray& raw)
     return out;
 }
 
-bool readFile(QIODevice& device, Entries& map)
+Entries entriesOf(QByteArrayView fileText)
 {
-    const QByteArray data = device.readAll();
-    int pos = data.startsWith("\xEF\xBB\xBF") ? 3 : 0;
-    QString section;  // "" for [General], else "Name/"
-    Line line;
-    while (nextLine(data, pos, line)) {
-        if (data[line.start] == '[') {
-            const int close = static_cast<int>(data.indexOf(']', line.start));
-            const int end = close == -1 || close >= line.start + line.length ? line.start + line.length : close;
-            const QByteArray name = data.mid(line.start + 1, end - line.start - 1).trimmed();
-            if (qstricmp(name.constData(), "general") == 0) {
-                section.clear();
-            } else {
-                section = qstricmp(name.constData(), "%general") == 0 ? QStringLiteral("General") : unescapeKey(name);
+    const files::IniDocument doc = files::IniDocument::parse(fileText, files::IniDocument::Syntax::IniFormat);
+    Entries map;
+    for (const files::IniDocument::Section& s : doc.sections()) {
+        QString section;  // "" for [General], else "Name/"
+        if (&s != &doc.sections().front()) {  // the lines before the first header have none
+            if (qstricmp(s.name.constData(), "general") != 0) {
+                section = qstricmp(s.name.constData(), "%general") == 0 ? QStringLiteral("General") : unescapeKey(s.name);
                 section += QLatin1Char('/');
             }
-            continue;
         }
-        if (line.equals == -1) continue;  // neither a section nor a key: skipped, as IniFormat does
-        int keyEnd = line.equals;
-        while (keyEnd > line.start && (data[keyEnd - 1] == ' ' || data[keyEnd - 1] == '\t')) --keyEnd;
-        const QString key = normalizedKey(section + unescapeKey(data.mid(line.start, keyEnd - line.start)));
-        bool stored = false;
-        const QString value =
-            unescapeValue(data.mid(line.equals + 1, line.start + line.length - line.equals - 1), &stored);
-        if (stored && !key.isEmpty()) map.insert(key, value);
+        for (const files::IniDocument::Line& line : s.lines) {
+            if (line.equals == -1) continue;  // neither a section nor a key: skipped, as IniFormat does
+            const QString key = normalizedKey(section + unescapeKey(doc.key(line)));
+            bool stored = false;
+            const QString value = unescapeValue(doc.value(line), &stored);
+            if (stored && !key.isEmpty()) map.insert(key, value);
+        }
     }
-    return true;
+    return map;
 }
 
-bool writeFile(QIODevice& device, const Entries& map)
+QByteArray fileTextOf(const Entries& map)
 {
     // Sections in order, the keys without a section first (IniFormat's [General]).
-    QMap<QString, QByteArray> sections;
-    QByteArray general;
+    QMap<QString, Entries> sections;
     for (auto it = map.constBegin(); it != map.constEnd(); ++it) {
         const qsizetype slash = it.key().indexOf(QLatin1Char('/'));
-        const QByteArray line =
-            escapeKey(slash < 0 ? it.key() : it.key().mid(slash + 1)) + '=' + escapeValue(it.value()) + '\n';
         if (slash < 0)
-            general += line;
+            sections[QString()].insert(it.key(), it.value());
         else
-            sections[it.key().left(slash)] += line;
+            sections[it.key().left(slash)].insert(it.key().mid(slash + 1), it.value());
     }
-    QByteArray out;
-    if (!general.isEmpty()) out += "[General]\n" + general;
+    files::IniDocument doc(files::IniDocument::Syntax::IniFormat);
     for (auto it = sections.constBegin(); it != sections.constEnd(); ++it) {
-        if (!out.isEmpty()) out += '\n';
+        if (doc.sections().size() > 1) doc.sections().back().appendBlank();
         // A section named like IniFormat's keyless [General] in any case gets its first letter
         // escaped, or it would read back as keys without a section.
         QByteArray name = escapeKey(it.key());
-        if (it.key() == QLatin1String("General"))
+        if (it.key().isNull())
+            name = "General";
+        else if (it.key() == QLatin1String("General"))
             name = "%General";
         else if (it.key().compare(QLatin1String("general"), Qt::CaseInsensitive) == 0)
             name = QByteArray("%") + QByteArray::number(it.key().at(0).unicode(), 16).toUpper() + name.mid(1);
-        out += '[' + name + "]\n" + it.value();
+        files::IniDocument::Section& section = doc.appendSection(name);
+        for (auto entry = it.value().constBegin(); entry != it.value().constEnd(); ++entry)
+            doc.setValue(section, escapeKey(entry.key()), escapeValue(entry.value()));
     }
-    return device.write(out) == out.size();
+    return doc.serialize();
 }
 
 }  // namespace kg::teststand::rawini

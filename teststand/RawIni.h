@@ -1,5 +1,6 @@
 #pragma once
-// Settings files in QSettings' INI layout, read so that every value is the text stored.
+// Settings files in QSettings' INI layout (files/IniDocument.h, Syntax::IniFormat), read so that
+// every value is the text stored.
 //
 // QSettings' own IniFormat reads an unquoted comma as a list separator: a hand-edited "1,5" comes
 // back as the list (1, 5), its text cannot be had, and the next write turns it into "1, 5". This
@@ -9,7 +10,6 @@
 // with IniFormat.
 #include <QByteArray>
 #include <QByteArrayView>
-#include <QIODevice>
 #include <QMap>
 #include <QString>
 
@@ -35,7 +35,7 @@ QByteArray escapeKey(const QString& key);
 QString unescapeKey(const QByteArray& raw);
 
 // The whole file, keys as "Section/Key/..." (top-level keys without a section come from [General]).
-bool readFile(QIODevice& device, Entries& map);
-bool writeFile(QIODevice& device, const Entries& map);
+Entries entriesOf(QByteArrayView fileText);
+QByteArray fileTextOf(const Entries& entries);
 
 }  // namespace kg::teststand::rawini

@@ -4,9 +4,9 @@
 #include <QFile>
 #include <QFileInfo>
 #include <QLockFile>
-#include <QSaveFile>
 
 #include "core/Error.h"
+#include "files/WholeFile.h"
 #include "teststand/RawIni.h"
 #include "teststand/TestStand.h"
 
@@ -23,15 +23,14 @@ namespace {
 rawini::Entries readEntries(const std::string& path)
 {
     const QString file = QString::fromStdString(path);
-    rawini::Entries entries;
-    if (!QFileInfo::exists(file)) return entries;
+    if (!QFileInfo::exists(file)) return {};
     QFile f(file);
     if (!f.open(QIODevice::ReadOnly))
         fail("The settings file \"" + path + "\" cannot be read: " + f.errorString().toStdString());
-    rawini::readFile(f, entries);
+    const QByteArray text = f.readAll();
     if (f.error() != QFileDevice::NoError)
         fail("The settings file \"" + path + "\" cannot be read: " + f.errorString().toStdString());
-    return entries;
+    return rawini::entriesOf(text);
 }
 
 }  // namespace
@@ -66,15 +65,10 @@ void SettingsFile::write(const std::vector<std::pair<std::string, std::string>>&
     rawini::Entries all = readEntries(path_);
     for (const auto& [key, value] : entries) all.insert(rawini::fromUtf8Text(key), rawini::fromUtf8Text(value));
 
-    // Unbuffered, so a short write (a full disk) shows in write()'s count: a buffered QSaveFile
-    // loses it at close and commits the cut file.
-    QSaveFile out(file);
-    if (!out.open(QIODevice::WriteOnly | QIODevice::Unbuffered)) cannotWrite(out.errorString());
-    if (!rawini::writeFile(out, all)) {
-        out.cancelWriting();
-        cannotWrite(QStringLiteral("not all of it could be written; the disk may be full"));
-    }
-    if (!out.commit()) cannotWrite(out.errorString());
+    if (const auto failed = files::writeWholeFile(file, rawini::fileTextOf(all), files::Sync::ToDisk))
+        cannotWrite(failed->step == files::WriteFailure::Write
+                        ? QStringLiteral("not all of it could be written; the disk may be full")
+                        : failed->reason);
 }
 
 std::string settingsKey(std::initializer_list<std::pair<const char*, std::string>> parts, const std::string& what)

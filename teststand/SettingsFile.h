@@ -6,9 +6,9 @@
 // file in a process-wide cache, and after a failed sync it keeps the unwritten values there, read
 // back as if stored and written by the next sync of any QSettings on that file. So every read
 // reads the file, and every write is one locked, atomic replacement of the file, as QSettings
-// makes it (QLockFile beside the file, QSaveFile synced to disk and renamed), with every byte
-// checked as written: a write that fails raises an error and leaves the previous file exactly as
-// it was.
+// makes it (QLockFile beside the file, then files/WholeFile.h synced to disk and renamed), with
+// every byte checked as written: a write that fails raises an error and leaves the previous file
+// exactly as it was.
 #include <initializer_list>
 #include <optional>
 #include <string>

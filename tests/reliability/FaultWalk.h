@@ -6,7 +6,6 @@
 #include <gtest/gtest.h>
 
 #include <QByteArray>
-#include <QBuffer>
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
@@ -82,12 +81,7 @@ inline QByteArray fileBytes(const QString& path)
 
 inline teststand::rawini::Entries iniEntries(const QByteArray& text)
 {
-    QBuffer b;
-    b.setData(text);
-    b.open(QIODevice::ReadOnly);
-    teststand::rawini::Entries entries;
-    teststand::rawini::readFile(b, entries);
-    return entries;
+    return teststand::rawini::entriesOf(text);
 }
 
 // What a failed command may leave of the settings file: the file exactly as it was, or a whole

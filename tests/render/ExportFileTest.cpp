@@ -3,7 +3,6 @@
 
 #include <QDir>
 #include <QImage>
-#include <sys/stat.h>
 
 #include "chart/control/render/ChartExport.h"
 #include "render/RenderSamples.h"
@@ -102,40 +101,6 @@ INSTANTIATE_TEST_SUITE_P(
         FailureCase{"folderInTheWay", "taken.png", {800, 600}, errc::PathFileAccess, "taken.png"},
         FailureCase{"badSizeKeepsTheOldFile", "keep.png", {0, 600}, errc::InvalidProcedureCall, "size"}),
     samples::rowName);
-
-struct ModeCase {
-    const char* name;
-    mode_t existing;  // 0: no file before the export
-};
-
-class ExportModeTest : public ::testing::TestWithParam<ModeCase> {};
-
-// A new file is readable as the user's file mask allows (not owner-only like a temporary file);
-// a replaced file keeps the mode it had.
-TEST_P(ExportModeTest, FileModeIsThatOfAnOrdinaryFile)
-{
-    ChartControl chart;
-    sampleChart(chart);
-    QTemporaryDir dir = samples::scratchDir();
-    const QByteArray path = QFile::encodeName(dir.filePath(QStringLiteral("chart.svg")));
-    if (GetParam().existing) {
-        QFile old(QString::fromLocal8Bit(path));
-        ASSERT_TRUE(old.open(QIODevice::WriteOnly));
-        old.close();
-        ASSERT_EQ(::chmod(path.constData(), GetParam().existing), 0);
-    }
-    const mode_t mask = ::umask(0);
-    ::umask(mask);
-    exportChart(chart, path.toStdString(), QSize(200, 100));
-    struct stat st {};
-    ASSERT_EQ(::stat(path.constData(), &st), 0);
-    EXPECT_EQ(st.st_mode & 0777, GetParam().existing ? GetParam().existing : (0666 & ~mask));
-}
-
-INSTANTIATE_TEST_SUITE_P(Modes, ExportModeTest,
-                         ::testing::Values(ModeCase{"newFile", 0}, ModeCase{"replacedPrivateFile", 0600},
-                                           ModeCase{"replacedSharedFile", 0664}),
-                         samples::rowName);
 
 }  // namespace
 }  // namespace kg::control

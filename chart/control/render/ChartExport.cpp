@@ -10,8 +10,8 @@
 #include "chart/control/render/ChartPainter.h"
 #include "chart/control/render/Colors.h"
 #include "chart/control/render/PngWriter.h"
-#include "chart/control/render/WholeFile.h"
 #include "core/Error.h"
+#include "files/WholeFile.h"
 
 namespace kg::control {
 
@@ -108,7 +108,10 @@ void exportChart(const ChartControl& chart, const std::string& path, QSize size)
     const QByteArray bytes = suffix == QLatin1String("png")   ? encodePng(renderImage(chart, size))
                              : suffix == QLatin1String("svg") ? svgBytes(chart, size)
                                                               : pdfBytes(chart, size);
-    writeWholeFile(path, bytes);
+    // Unsynced: see files/WholeFile.h for the time an fsync costs here.
+    if (const auto failed = files::writeWholeFile(file, bytes, files::Sync::None))
+        throw Error(errc::PathFileAccess,
+                    "Path/File access error: cannot write " + path + ": " + failed->reason.toStdString());
 }
 
 }  // namespace kg::control

@@ -1,4 +1,4 @@
-#include "chart/control/render/WholeFile.h"
+#include "files/WholeFile.h"
 
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -11,14 +11,13 @@
 #include <cstdio>
 #include <cstring>
 
-#include "core/Error.h"
-
-namespace kg::control {
+namespace kg::files {
 
 namespace {
-Error cannotWrite(const std::string& path, int error)
+
+WriteFailure failure(WriteFailure::Step step, int error)
 {
-    return Error(errc::PathFileAccess, "Path/File access error: cannot write " + path + ": " + std::strerror(error));
+    return {step, QString::fromLocal8Bit(std::strerror(error))};
 }
 
 bool writeAll(int fd, const char* data, size_t size)
@@ -40,11 +39,25 @@ QByteArray temporaryName(const QFileInfo& target)
                          QString::number(QRandomGenerator::global()->generate64(), 36);
     return QFile::encodeName(name);
 }
+
+// The file a link leads to (followed as far as it goes, not resolved to a canonical path, so a
+// link to a file not there yet still names it).
+QFileInfo linkedFile(QFileInfo file)
+{
+    for (int depth = 128; depth > 0 && file.isSymLink(); --depth) file.setFile(file.symLinkTarget());
+    return file;
+}
+
 }  // namespace
 
-void writeWholeFile(const std::string& path, const QByteArray& bytes)
+std::optional<WriteFailure> writeWholeFile(const QString& path, const QByteArray& bytes, Sync sync)
 {
-    const QFileInfo target(QString::fromStdString(path));
+    QFileInfo target(path);
+    if (sync == Sync::ToDisk) {
+        target = linkedFile(target);
+        if (target.exists() && !target.isWritable())
+            return WriteFailure{WriteFailure::Open, QStringLiteral("Existing file %1 is not writable").arg(path)};
+    }
     const QByteArray to = QFile::encodeName(target.absoluteFilePath());
     QByteArray from;
     int fd = -1;
@@ -54,21 +67,27 @@ void writeWholeFile(const std::string& path, const QByteArray& bytes)
         fd = ::open(from.constData(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
         if (fd < 0 && errno != EEXIST) break;
     }
-    if (fd < 0) throw cannotWrite(path, errno);
+    if (fd < 0) return failure(WriteFailure::Open, errno);
     struct stat old {};
     if (::stat(to.constData(), &old) == 0 && S_ISREG(old.st_mode)) ::fchmod(fd, old.st_mode & 07777);  // keeps its mode
-    const bool written = writeAll(fd, bytes.constData(), size_t(bytes.size()));
-    const int writeError = errno;
-    if (::close(fd) != 0 || !written) {
-        const int error = written ? errno : writeError;
+    const auto giveUp = [&](WriteFailure::Step step, int error) {
+        ::close(fd);
         ::unlink(from.constData());
-        throw cannotWrite(path, error);
+        return failure(step, error);
+    };
+    if (!writeAll(fd, bytes.constData(), size_t(bytes.size()))) return giveUp(WriteFailure::Write, errno);
+    if (sync == Sync::ToDisk && ::fsync(fd) != 0) return giveUp(WriteFailure::Sync, errno);
+    if (::close(fd) != 0) {
+        const int error = errno;
+        ::unlink(from.constData());
+        return failure(WriteFailure::Write, error);
     }
     if (std::rename(from.constData(), to.constData()) != 0) {
         const int error = errno;
         ::unlink(from.constData());
-        throw cannotWrite(path, error);
+        return failure(WriteFailure::Rename, error);
     }
+    return std::nullopt;
 }
 
-}  // namespace kg::control
+}  // namespace kg::files
