@@ -51,7 +51,7 @@ void runRequest()
     auto graph = makeRef<cTavixGraph>();
     graph->SourceForm(Variant(stand().form));
     Args none;
-    graph->invoke(0x6003000E, kMethod, none);
+    graph->invoke(KG_DISPID_GENERATECHART_JOBSTATUSREPORT, kMethod, none);
 }
 
 void BM_JobStatusRequest(benchmark::State& state)

@@ -34,7 +34,7 @@ void DrawBookingsGraph(BuildContext& context, const std::string& header, const s
     control::ChartControl& chart1 = window.Chart1();
     for (int32_t r = grid.FixedRows(), rows = grid.Rows(); r < rows; ++r)
         chart1.group1.pointLabels.push_back(toText(grid.GetValueFromCell(r, 0)));
-    chart1.chartArea.x.annotationMethod = 2;
+    chart1.chartArea.x.annotationMethod = control::kAnnotatePointLabels;
     VariantArray& table = context.table();
     for (int32_t r = grid.FixedRows(), rows = grid.Rows(); r < rows; ++r)
         table.at(1, r - grid.FixedRows() + 1) = grid.GetValueFromCell(r, measureColumn);
@@ -56,7 +56,7 @@ void DrawBookingsDualGraph(BuildContext& context, const std::string& header, int
     chart1.group1.seriesLabels.push_back(toText(grid.GetValueFromCell(0, measureColumn2)));
     for (int32_t r = grid.FixedRows(), rows = grid.Rows(); r < rows; ++r)
         chart1.group1.pointLabels.push_back(toText(grid.GetValueFromCell(r, 0)));
-    chart1.chartArea.x.annotationMethod = 2;
+    chart1.chartArea.x.annotationMethod = control::kAnnotatePointLabels;
     VariantArray& table = context.table();
     for (int32_t r = grid.FixedRows(), rows = grid.Rows(); r < rows; ++r) {
         table.at(1, r - grid.FixedRows() + 1) = grid.GetValueFromCell(r, measureColumn1);

@@ -12,6 +12,7 @@ c2dChart& prepareChart(BuildContext& context, const ChartFrame& frame, const std
     c.setXMinData(1);
     c.setXMaxData(lastPoint());
     c.InitChart();
+    if (frame.minPoints > 0 && c.NumPoints() < frame.minPoints) c.setNumPoints(frame.minPoints);
     context.table().redim(c.NumSeries(), c.NumPoints());
     c.setXAxisLabels(false);
     window.Chart1().group1.pointLabels.clear();
@@ -20,11 +21,12 @@ c2dChart& prepareChart(BuildContext& context, const ChartFrame& frame, const std
 
 void showChart(BuildContext& context, bool redrawVisible)
 {
-    context.hourglass(false);
+    c2dChart& chart = context.chart();
     ChartWindowPort& window = context.window();
+    context.hourglass(false);
     window.setRedrawVisible(redrawVisible);
     window.Show();
-    context.chart().DrawChart(context.table());
+    chart.DrawChart(context.table());
 }
 
 }  // namespace kg::builders

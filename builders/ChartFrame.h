@@ -1,7 +1,7 @@
 #pragma once
-// What every grid builder does around filling the value table: the chart set up on the chart
-// window's control with its titles, series count and legend, the table sized to it, and at the
-// end the pointer handed back, the window shown and the table drawn.
+// What every builder does around filling the value table: the chart set up on the chart window's
+// control with its titles, series count and legend, the table sized to it, and at the end the
+// pointer handed back, the window shown and the table drawn.
 #include <cstdint>
 #include <functional>
 #include <string>
@@ -14,6 +14,9 @@ struct ChartFrame {
     std::string header, xTitle, yTitle;
     int32_t numSeries = 1;
     bool showLegend = true;
+    // The table has at least this many points, however few the chart's X range gives; 0: no
+    // minimum, a negative count still fails when the table is sized.
+    int32_t minPoints = 0;
 };
 
 // Points run from 1 to `lastPoint()`, asked of the grid only once the chart is initialised: the

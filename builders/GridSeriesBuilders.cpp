@@ -32,7 +32,7 @@ void drawGridSeries(BuildContext& context, const GridChart& request, Points poin
     }
     for (int32_t col = 1, last = lastPoint(grid, points); col <= last; ++col)
         chart1.group1.pointLabels.push_back(grid.textmatrix(0, col));
-    chart1.chartArea.x.annotationMethod = 2;
+    chart1.chartArea.x.annotationMethod = control::kAnnotatePointLabels;
 
     VariantArray& table = context.table();
     const int32_t fixedRows = grid.FixedRows(), rows = grid.Rows();

@@ -9,20 +9,21 @@
 #include <functional>
 #include <string>
 
+#include "chart/ChartStyle.h"
 #include "chart/control/model/ChartControl.h"
-#include "core/Dispatch.h"
+#include "core/Dispatch.h"  // the host objects are reached late-bound
 
 namespace kg {
 
-class c2dChart : public TableObject {
+class c2dChart : public RefCounted {
 public:
     using ObjectSource = std::function<Variant()>;
     c2dChart(ObjectSource appServices, ObjectSource settings);
 
-    void Initialize(control::ChartControl* gfChartForm, const std::string& fHeader, const std::string& fFooter,
-                    const std::string& fXTitle, const std::string& fYTitle);
+    void Initialize(control::ChartControl* control, const std::string& header, const std::string& footer,
+                    const std::string& xTitle, const std::string& yTitle);
     void InitChart();
-    void DrawChart(VariantArray& m_vArray);
+    void DrawChart(VariantArray& table);
     void PrintChart();
 
     // The bound control; Error 91 before Initialize.
@@ -33,59 +34,52 @@ public:
     int32_t Rotation() const { return control().chartArea.view3D.rotation; }
     int32_t Elevation() const { return control().chartArea.view3D.elevation; }
     int32_t Depth() const { return control().chartArea.view3D.depth; }
-    void setRotation(int32_t v);
-    void setElevation(int32_t v);
-    void setDepth(int32_t v);
+    void setRotation(int32_t degrees);
+    void setElevation(int32_t degrees);
+    void setDepth(int32_t depth);
 
     // Stored once per process, shared by every chart object.
     static bool View3D();
-    static void setView3D(bool b);
+    static void setView3D(bool on);
     static bool ShowLegend();
-    static void setShowLegend(bool b);
+    static void setShowLegend(bool on);
 
     bool PointLabels() const { return pointLabels_; }
-    void setPointLabels(bool b) { pointLabels_ = b; }
+    void setPointLabels(bool on) { pointLabels_ = on; }
     bool XAxisLabels() const { return xAxisLabels_; }
-    void setXAxisLabels(bool b) { xAxisLabels_ = b; }
+    void setXAxisLabels(bool on) { xAxisLabels_ = on; }
     const std::string& ChartHeader() const { return header_; }
-    void setChartHeader(std::string s) { header_ = std::move(s); }
+    void setChartHeader(std::string text) { header_ = std::move(text); }
     const std::string& ChartFooter() const { return footer_; }
-    void setChartFooter(std::string s) { footer_ = std::move(s); }
+    void setChartFooter(std::string text) { footer_ = std::move(text); }
     const std::string& ChartXTitle() const { return xTitle_; }
-    void setChartXTitle(std::string s) { xTitle_ = std::move(s); }
+    void setChartXTitle(std::string text) { xTitle_ = std::move(text); }
     const std::string& ChartYTitle() const { return yTitle_; }
-    void setChartYTitle(std::string s) { yTitle_ = std::move(s); }
+    void setChartYTitle(std::string text) { yTitle_ = std::move(text); }
     int32_t XMaxData() const { return xMax_; }
-    void setXMaxData(int32_t v) { xMax_ = v; }
+    void setXMaxData(int32_t value) { xMax_ = value; }
     int32_t YMaxData() const { return yMax_; }
-    void setYMaxData(int32_t v) { yMax_ = v; }
+    void setYMaxData(int32_t value) { yMax_ = value; }
     int32_t XMinData() const { return xMin_; }
-    void setXMinData(int32_t v) { xMin_ = v; }
+    void setXMinData(int32_t value) { xMin_ = value; }
     int32_t YMinData() const { return yMin_; }
-    void setYMinData(int32_t v) { yMin_ = v; }
+    void setYMinData(int32_t value) { yMin_ = value; }
     int32_t NumSeries() const { return numSeries_; }
-    void setNumSeries(int32_t v) { numSeries_ = v; }
+    void setNumSeries(int32_t value) { numSeries_ = value; }
     int32_t NumPoints() const { return numPoints_; }
-    void setNumPoints(int32_t v) { numPoints_ = v; }
+    void setNumPoints(int32_t value) { numPoints_ = value; }
     int16_t ChartType() const { return chartType_; }
-    void setChartType(int16_t v) { chartType_ = v; }
+    void setChartType(int16_t value) { chartType_ = value; }
     int16_t LineWidth() const { return lineWidth_; }
-    void setLineWidth(int16_t v) { lineWidth_ = v; }
-
-    // Dispatch surface: every property and operation by its name.
-    Variant invoke(DispId id, uint16_t kind, Args& args) override;
-    std::string objectName() const override { return "c2dChart"; }
-
-protected:
-    const std::vector<MemberInfo>& members() const override;
+    void setLineWidth(int16_t value) { lineWidth_ = value; }
 
 private:
     void DrawPieChart(VariantArray& table);
     void addValueLabel(const Variant& cell, int32_t series, int32_t point);
     void setupLegend();
-    std::string readSetting(const char* key, const char* defaultValue);
+    std::string readSetting(chartstyle::Key key);
     template <class T>
-    T readWholeSetting(const char* key, const char* defaultValue);
+    T readWholeSetting(chartstyle::Key key);
 
     ObjectSource appServices_, settings_;
     Ref<control::ChartControl> control_;

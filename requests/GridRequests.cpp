@@ -16,7 +16,7 @@ using Builder = void (*)(builders::BuildContext&, const builders::GridChart&);
 
 struct GridRequestRow {
     const char* grid;
-    int16_t chartKind;
+    int16_t requestKind;
     const char* header;
     TotalForm total;
     const char* yTitle;
@@ -27,15 +27,15 @@ const GridRequestRow& rowOf(GridRequest r)
 {
     using namespace builders;
     static const GridRequestRow rows[] = {
-        {"grid1", kHourly, "Qty of Bookings: Total = ", TotalForm::Plain, "Quantity", DrawHourlyGraph},
-        {"grid2", kHourly, "Value of Bookings: Total = ", TotalForm::Dollars, "Value", DrawHourlyGraph},
-        {"grid3", kHourly, "Average Value of Bookings: Total = ", TotalForm::Dollars, "Value", DrawHourlyGraph},
-        {"grid1", kPropGraph, "New Bookings: Total = ", TotalForm::Plain, "Quantity", DrawPropGraph},
-        {"grid2", kPropGraph, "Continuing Jobs: Total = ", TotalForm::Whole, "Value", DrawPropGraph},
-        {"grid3", kPropGraph, "Nett Jobs By Month: Total = ", TotalForm::Whole, "Value", DrawPropGraph},
-        {"grid1", kYearly, "Quantity of Bookings: Total = ", TotalForm::Plain, "Quantity", DrawYearlyRpt},
-        {"grid2", kYearly, "Total Value of Jobs: Total = ", TotalForm::Dollars, "Value", DrawYearlyRpt},
-        {"grid3", kYearly, "Average Value of Jobs: Total = ", TotalForm::Dollars, "Value", DrawYearlyRpt},
+        {"grid1", kHourlyRequest, "Qty of Bookings: Total = ", TotalForm::Plain, "Quantity", DrawHourlyGraph},
+        {"grid2", kHourlyRequest, "Value of Bookings: Total = ", TotalForm::Dollars, "Value", DrawHourlyGraph},
+        {"grid3", kHourlyRequest, "Average Value of Bookings: Total = ", TotalForm::Dollars, "Value", DrawHourlyGraph},
+        {"grid1", kPropGraphRequest, "New Bookings: Total = ", TotalForm::Plain, "Quantity", DrawPropGraph},
+        {"grid2", kPropGraphRequest, "Continuing Jobs: Total = ", TotalForm::Whole, "Value", DrawPropGraph},
+        {"grid3", kPropGraphRequest, "Nett Jobs By Month: Total = ", TotalForm::Whole, "Value", DrawPropGraph},
+        {"grid1", kYearlyRequest, "Quantity of Bookings: Total = ", TotalForm::Plain, "Quantity", DrawYearlyRpt},
+        {"grid2", kYearlyRequest, "Total Value of Jobs: Total = ", TotalForm::Dollars, "Value", DrawYearlyRpt},
+        {"grid3", kYearlyRequest, "Average Value of Jobs: Total = ", TotalForm::Dollars, "Value", DrawYearlyRpt},
     };
     return rows[static_cast<int>(r)];
 }
@@ -66,7 +66,7 @@ void generateGridChart(GridRequest request, int32_t numSeries, const Variant& to
         uiServices().messageBox(kNoData);
         return;
     }
-    giChartKind = row.chartKind;
+    giChartKind = row.requestKind;
     HourglassOn();
     row.builder(buildContext(), {gridObject, row.header + writeTotal(total, row.total), row.yTitle, numSeries});
 }

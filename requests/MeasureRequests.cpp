@@ -1,5 +1,6 @@
 #include "builders/BookingsBuilders.h"
 #include "builders/LateBoundGrid.h"
+#include "requests/Measures.h"
 #include "requests/Requests.h"
 #include "requests/UiServices.h"
 #include "requests/modMain.h"
@@ -10,25 +11,7 @@ using namespace modMain;
 
 namespace {
 
-// The choice table: the builder's measure column(s), Y title and the headers of both families.
-struct Choice {
-    int32_t column1, column2;  // column2 0: one measure
-    const char* yTitle;
-    const char* quoteTypeHeader;
-    const char* categoryHeader;
-};
-
-constexpr Choice kChoices[] = {
-    {1, 0, "Quantity", "Quote Type by Quantity", "Category by Quantity"},
-    {2, 0, "$Value", "Quote Type by $Value", "Category by $Value"},
-    {3, 0, "Average $Value", "Quote Type by Average Value", "Category by Average Value"},
-    {4, 0, "% Jobs", "Quote Type by Percent of Jobs", "Category by Percent of Jobs"},
-    {5, 0, "% by $Value", "Quote Type by Percent of $Value", "Category by Percent of $Value"},
-    {2, 3, "", "Quote Type by $Value and Average $Value", "Category by $Value and Average $Value"},
-    {4, 5, "", "Quote Type by %Jobs and % $Value", "Category by %Jobs and % $Value"},
-};
-
-void measureRequest(int16_t chartKind)
+void measureRequest(int16_t requestKind)
 {
     GraphInitialize();
     builders::LateBoundGrid grid(call(gvSourceForm, "gridsettings1"));
@@ -38,30 +21,31 @@ void measureRequest(int16_t chartKind)
         return;
     }
     // Stored before the dialog: a cancelled choice still leaves the code.
-    giChartKind = chartKind;
-    chooseAndDrawMeasure(chartKind);
+    giChartKind = requestKind;
+    chooseAndDrawMeasure(requestKind);
 }
 
 }  // namespace
 
-bool chooseAndDrawMeasure(int16_t chartKind)
+bool chooseAndDrawMeasure(int16_t requestKind)
 {
-    const bool quoteTypes = chartKind == kBookings;
-    const int16_t iChoice = uiServices().chooseData(quoteTypes ? ChoiceDialog::QuoteType : ChoiceDialog::Category);
-    if (iChoice == kChoiceCancelled) return false;
+    const bool quoteTypes = requestKind == kBookingsRequest;
+    const int16_t choice = uiServices().chooseData(quoteTypes ? ChoiceDialog::QuoteType : ChoiceDialog::Category);
+    if (choice == kChoiceCancelled) return false;
     HourglassOn();
-    if (iChoice < 0 || iChoice > 6) return true;  // no row of the table matches: nothing is drawn
-    const Choice& c = kChoices[iChoice];
-    const std::string header = quoteTypes ? c.quoteTypeHeader : c.categoryHeader;
-    if (c.column2 == 0)
-        builders::DrawBookingsGraph(buildContext(), header, c.yTitle, c.column1);
+    // No row of the table matches: nothing is drawn.
+    if (choice < 0 || choice >= int16_t(kMeasures.size())) return true;
+    const Measure& m = kMeasures[size_t(choice)];
+    const std::string header = quoteTypes ? m.quoteTypeHeader : m.categoryHeader;
+    if (m.column2 == 0)
+        builders::DrawBookingsGraph(buildContext(), header, m.yTitle, m.column1);
     else
-        builders::DrawBookingsDualGraph(buildContext(), header, c.column1, c.column2);
+        builders::DrawBookingsDualGraph(buildContext(), header, m.column1, m.column2);
     return true;
 }
 
-void GenerateChart_BookingsReport() { measureRequest(kBookings); }
-void GenerateChart_SalesDeclaration() { measureRequest(kCategories); }
-void GenerateChart_ServCatSumm() { measureRequest(kCategories); }
+void GenerateChart_BookingsReport() { measureRequest(kBookingsRequest); }
+void GenerateChart_SalesDeclaration() { measureRequest(kCategoryRequest); }
+void GenerateChart_ServCatSumm() { measureRequest(kCategoryRequest); }
 
 }  // namespace kg::requests

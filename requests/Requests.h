@@ -19,9 +19,9 @@ void generateGridChart(GridRequest request, int32_t numSeries, const Variant& to
 void GenerateChart_BookingsReport();
 void GenerateChart_SalesDeclaration();
 void GenerateChart_ServCatSumm();
-// Shows the data choice dialog of a chart kind (1 or 2) and draws the chosen measure; the window's
-// Redraw repeats exactly this. Returns false when the user cancelled.
-bool chooseAndDrawMeasure(int16_t chartKind);
+// Shows the data choice dialog of a measure request (kBookingsRequest or kCategoryRequest) and draws
+// the chosen measure; the window's Redraw repeats exactly this. Returns false when the user cancelled.
+bool chooseAndDrawMeasure(int16_t requestKind);
 
 void GenerateChart_JobStatusReport();
 

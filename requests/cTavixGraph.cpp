@@ -26,21 +26,41 @@ std::string guidText(const Guid& g)
     return buf;
 }
 
-DispId cTavixGraph::idOfName(std::string_view name) const
+const Operation* findOperation(std::string_view name)
 {
     for (const Operation& op : kOperations)
-        if (equalsNoCase(op.name, name)) return op.id;
+        if (equalsNoCase(op.name, name)) return &op;
+    return nullptr;
+}
+
+DispId cTavixGraph::idOfName(std::string_view name) const
+{
+    if (const Operation* op = findOperation(name)) return op->id;
     throw Error::memberNotFound(objectName() + "." + std::string(name));
 }
 
-void cTavixGraph::SourceForm(const Variant& fForm)
+void cTavixGraph::SourceForm(const Variant& form)
 {
-    if (!fForm.isObject()) throw Error::typeMismatch("SourceForm expects an object, not a " +
-                                                     std::string(typeName(fForm.type())));
-    modMain::gvSourceForm = fForm;
+    Args args{form};
+    handlers::SourceForm(args);
 }
 
 void cTavixGraph::GraphInitialize() { modMain::GraphInitialize(); }
+
+namespace handlers {
+void SourceForm(Args& args)
+{
+    const Variant& form = args[0];
+    if (!form.isObject()) throw Error::typeMismatch("SourceForm expects an object, not a " +
+                                                    std::string(typeName(form.type())));
+    modMain::gvSourceForm = form;
+}
+void GraphInitialize(Args&) { modMain::GraphInitialize(); }
+void BookingsReport(Args&) { requests::GenerateChart_BookingsReport(); }
+void SalesDeclaration(Args&) { requests::GenerateChart_SalesDeclaration(); }
+void JobStatusReport(Args&) { requests::GenerateChart_JobStatusReport(); }
+void ServCatSumm(Args&) { requests::GenerateChart_ServCatSumm(); }
+}  // namespace handlers
 
 Variant cTavixGraph::invoke(DispId id, uint16_t kind, Args& args)
 {
@@ -57,47 +77,20 @@ Variant cTavixGraph::invoke(DispId id, uint16_t kind, Args& args)
     throw Error::memberNotFound(objectName() + " dispatch id " + std::to_string(id));
 }
 
-namespace {
-requests::GridRequest gridRequestOf(DispId id)
-{
-    using R = requests::GridRequest;
-    switch (id) {
-    case 0x60030009: return R::YearlyRpt1;
-    case 0x6003000A: return R::YearlyRpt2;
-    case 0x6003000B: return R::YearlyRpt3;
-    case 0x60030011: return R::PropGraph1;
-    case 0x60030012: return R::PropGraph2;
-    case 0x60030013: return R::PropGraph3;
-    case 0x60030014: return R::HourlyGraph1;
-    case 0x60030015: return R::HourlyGraph2;
-    default: return R::HourlyGraph3;
-    }
-}
-}  // namespace
-
 Variant cTavixGraph::dispatch(const Operation& op, uint16_t kind, Args& args)
 {
     if (op.kind == OperationKind::PropertyPut) {
         if (!(kind & (kPropertyPut | kPropertyPutRef)))
             throw Error::memberNotFound(std::string(op.name) + " is write-only");
-        expectArgs(args, 1, op.name);
-        SourceForm(args[0]);
-        return {};
+    } else if (!(kind & kMethod)) {
+        throw Error::memberNotFound(std::string(op.name) + " is a method");
     }
-    if (!(kind & kMethod)) throw Error::memberNotFound(std::string(op.name) + " is a method");
-    switch (op.id) {
-    case 0x6003000C: expectArgs(args, 0, op.name); requests::GenerateChart_BookingsReport(); return {};
-    case 0x6003000D: expectArgs(args, 0, op.name); requests::GenerateChart_SalesDeclaration(); return {};
-    case 0x6003000E: expectArgs(args, 0, op.name); requests::GenerateChart_JobStatusReport(); return {};
-    case 0x6003000F: expectArgs(args, 0, op.name); GraphInitialize(); return {};
-    case 0x60030010: expectArgs(args, 0, op.name); requests::GenerateChart_ServCatSumm(); return {};
-    default: break;
+    switch (op.arguments) {
+    case ArgumentShape::Form: expectArgs(args, 1, op.name); break;
+    case ArgumentShape::None: expectArgs(args, 0, op.name); break;
+    case ArgumentShape::SeriesAndTotal: expectArgs(args, 2, op.name); break;
     }
-    expectArgs(args, 2, op.name);
-    // lNumSeries is a 32-bit whole number: a value of another type is coerced as the caller's
-    // automation layer would, failing with Type mismatch or Overflow.
-    const int32_t lNumSeries = toLong(args[0]);
-    requests::generateGridChart(gridRequestOf(op.id), lNumSeries, args[1]);
+    op.handler(args);
     return {};
 }
 

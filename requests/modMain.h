@@ -17,13 +17,20 @@ inline Variant goSettings;
 inline Ref<c2dChart> goChart;
 inline Ref<ChartWindowPort> gfChart;
 inline Variant gvSourceForm;
-// Code of the last chart request: 1 bookings, 2 sales declaration / service categories, 3 yearly,
-// 4 prop graph, 5 hourly; 0 before the first request.
+// Code of the last chart request (a RequestKind); the window's Redraw repeats a measure choice.
 inline int16_t giChartKind = 0;
 // The value table handed to DrawChart: series 0..NumSeries by points 0..NumPoints.
 inline VariantArray gvArray;
 
-enum ChartKind : int16_t { kNoChart = 0, kBookings = 1, kCategories = 2, kYearly = 3, kPropGraph = 4, kHourly = 5 };
+// The request codes giChartKind holds.
+enum RequestKind : int16_t {
+    kNoRequest = 0,         // before the first request
+    kBookingsRequest = 1,   // bookings by quote type
+    kCategoryRequest = 2,   // sales declaration and service categories
+    kYearlyRequest = 3,
+    kPropGraphRequest = 4,
+    kHourlyRequest = 5,
+};
 
 // Busy pointer on and off; not nested: one off clears any number of ons.
 void HourglassOn();

@@ -124,7 +124,7 @@ void frmChart::mnuLabels2_Click() { setLabels(false); }
 
 void frmChart::mnuRedraw_Click()
 {
-    if (giChartKind == kBookings || giChartKind == kCategories) requests::chooseAndDrawMeasure(giChartKind);
+    if (giChartKind == kBookingsRequest || giChartKind == kCategoryRequest) requests::chooseAndDrawMeasure(giChartKind);
 }
 
 void frmChart::mnuSetup_Click()

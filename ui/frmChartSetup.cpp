@@ -9,6 +9,7 @@
 #include <cmath>
 #include <utility>
 
+#include "chart/ChartStyle.h"
 #include "requests/modMain.h"
 #include "core/Convert.h"
 #include "core/Error.h"
@@ -20,16 +21,14 @@ namespace kg::ui {
 
 namespace {
 
-constexpr const char* kSection = "2dCharts";
-constexpr const char* kFieldKeys[3] = {"Rotation", "Elevation", "Depth"};
+using chartstyle::Key;
+constexpr Key kFieldKeys[3] = {Key::Rotation, Key::Elevation, Key::Depth};
 constexpr const char* kFieldCaptions[3] = {"Rotation", "Elevation", "Depth"};
 constexpr int kFieldMinimum = -45;
 constexpr int kFieldMaximum = 45;
 constexpr double kFieldDesignValue = 10;
 
-// optChartType by index: the stored style name and the chart type code that goes with it.
-constexpr const char* kStyleNames[4] = {"Plot", "Bar", "Area", "Pie"};
-constexpr int16_t kChartTypeCodes[4] = {control::kPlot, control::kBar, control::kArea, control::kPie};
+// optChartType by index: chartstyle::kStyleNames.
 constexpr int kDesignChartType = 1;  // Bar
 constexpr int kDesignLabel = 1;      // labels off
 
@@ -38,25 +37,11 @@ void logEvent(const char* event)
     call(modMain::goAppServices, "LogFormEvent", {Variant(event), Variant("frmChartSetup")});
 }
 
-// The host wants its owner text fetched anew for every read and write.
-Variant settingsOwner()
-{
-    Args owner{Variant(std::string())};
-    call(modMain::goAppServices, "GetSettingsOwner", owner);
-    return owner[0];
-}
+std::string readSetting(Key key) { return chartstyle::read(modMain::goAppServices, modMain::goSettings, key); }
 
-std::string readSetting(const char* key, const char* defaultValue)
+void writeSetting(Key key, const std::string& value)
 {
-    Args args{Variant(kSection), Variant(key), Variant(defaultValue), settingsOwner(), Variant(std::string())};
-    call(modMain::goSettings, "ReadSetting", args);
-    return toText(args[4]);
-}
-
-void writeSetting(const char* key, const std::string& value)
-{
-    Args args{Variant(kSection), Variant(key), Variant(value), settingsOwner(), Variant()};
-    call(modMain::goSettings, "WriteSetting", args);
+    chartstyle::write(modMain::goAppServices, modMain::goSettings, key, value);
 }
 
 // The leading number of a stored text; a number beyond the Double range counts as infinite with
@@ -119,7 +104,8 @@ void frmChartSetup::buildControls()
         // Plot and Bar on the left, Area and Pie on the right.
         const int x = i < 2 ? 12 : 92;
         const int y = i % 2 == 0 ? 24 : 52;
-        optChartType[i] = place(new QRadioButton(kStyleNames[i], Frame2), typeNames[i], x, y, 76, 22);
+        const char* caption = chartstyle::kStyleNames[size_t(i)].name;
+        optChartType[i] = place(new QRadioButton(caption, Frame2), typeNames[i], x, y, 76, 22);
         chartTypeGroup_->addButton(optChartType[i], i);
     }
     optChartType[kDesignChartType]->setChecked(true);
@@ -155,7 +141,7 @@ void frmChartSetup::Form_Load()
 {
     logEvent("FormLoad");
 
-    const std::string view3D = readSetting("View3D", "1");
+    const std::string view3D = readSetting(Key::View3D);
     try {
         setChk3DValue(roundToInteger(readNumber(view3D)));
     } catch (const Error& e) {
@@ -163,13 +149,13 @@ void frmChartSetup::Form_Load()
         if (e.number() != errc::Overflow) throw;
     }
 
-    for (int i = 0; i < 3; ++i) num3D[i]->setValue(Variant(storedNumber(readSetting(kFieldKeys[i], "10"))));
+    for (int i = 0; i < 3; ++i) num3D[i]->setValue(Variant(storedNumber(readSetting(kFieldKeys[i]))));
 
-    const std::string style = readSetting("Style", "Bar");
+    const std::string style = readSetting(Key::Style);
     for (int i = 0; i < 4; ++i)
-        if (style == kStyleNames[i]) optChartType[i]->setChecked(true);
+        if (style == chartstyle::kStyleNames[size_t(i)].name) optChartType[i]->setChecked(true);
 
-    const std::string labels = readSetting("LabelsOnDefault", "0");
+    const std::string labels = readSetting(Key::LabelsOnDefault);
     if (labels == "1") optLabel[0]->setChecked(true);
     if (labels == "0") optLabel[1]->setChecked(true);
 }
@@ -187,14 +173,14 @@ void frmChartSetup::Command1_Click()
     const int type = chartTypeGroup_->checkedId() < 0 ? kDesignChartType : chartTypeGroup_->checkedId();
     const bool labelsOn = optLabel[0]->isChecked();
 
-    writeSetting("View3D", numberText(double(box)));
+    writeSetting(Key::View3D, numberText(double(box)));
     for (int i = 0; i < 3; ++i) {
         // An emptied field has no number text: it is stored empty, which reads back as 0.
         const Variant value = num3D[i]->Value();
         writeSetting(kFieldKeys[i], value.isNull() ? std::string() : numberText(value));
     }
-    writeSetting("Style", kStyleNames[type]);
-    writeSetting("LabelsOnDefault", labelsOn ? "1" : "0");
+    writeSetting(Key::Style, chartstyle::kStyleNames[size_t(type)].name);
+    writeSetting(Key::LabelsOnDefault, labelsOn ? "1" : "0");
 
     c2dChart& chart = modMain::chart();
     chart.setView3D(box == 1);
@@ -207,7 +193,7 @@ void frmChartSetup::Command1_Click()
     chart.setRotation(angles[0]);
     chart.setElevation(angles[1]);
     chart.setDepth(angles[2]);
-    chart.setChartType(kChartTypeCodes[type]);
+    chart.setChartType(chartstyle::kStyleNames[size_t(type)].type);
     chart.setPointLabels(labelsOn);
     accept();
 }

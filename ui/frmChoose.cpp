@@ -7,22 +7,13 @@
 #include <QRadioButton>
 #include <QVBoxLayout>
 
+#include "requests/Measures.h"
 #include "requests/modMain.h"
 #include "ui/WindowObject.h"
 
 namespace kg::ui {
 
 namespace {
-const char* const kQuoteTypeCaptions[7] = {
-    "Quote Type by Quantity",      "Quote Type by Value", "Quote Type by Average Value",
-    "Quote Type by % Jobs",        "Quote Type by % of $", "Quote Type by $Value and Average $Value",
-    "Quote Type by % Jobs and % $Value",
-};
-const char* const kCategoryCaptions[7] = {
-    "Category by Quantity", "Category by Value", "Category by Average Value", "Category by % Jobs",
-    "Category by % of $",   "Category by $Value and Average $Value", "Category by % Jobs and % $Value",
-};
-
 void logEvent(const char* event, const QString& name)
 {
     call(modMain::goAppServices, "LogFormEvent", {Variant(event), Variant(name.toStdString())});
@@ -31,7 +22,8 @@ void logEvent(const char* event, const QString& name)
 
 QString frmChoose::captionOf(ChoiceDialog kind, int index)
 {
-    return QString::fromUtf8((kind == ChoiceDialog::QuoteType ? kQuoteTypeCaptions : kCategoryCaptions)[index]);
+    const requests::Measure& m = requests::kMeasures[size_t(index)];
+    return QString::fromUtf8(kind == ChoiceDialog::QuoteType ? m.quoteTypeCaption : m.categoryCaption);
 }
 
 frmChoose::frmChoose(ChoiceDialog kind, QWidget* parent) : QDialog(parent)
@@ -39,7 +31,7 @@ frmChoose::frmChoose(ChoiceDialog kind, QWidget* parent) : QDialog(parent)
     setObjectName(kind == ChoiceDialog::QuoteType ? "frmChoose1" : "frmChoose2");
     setWindowTitle("Select Chart Data");
     auto* layout = new QVBoxLayout(this);
-    for (int i = 0; i < 7; ++i) {
+    for (int i = 0; i < int(requests::kMeasures.size()); ++i) {
         optData[i] = new QRadioButton(captionOf(kind, i), this);
         optData[i]->setObjectName(QString("optData_%1").arg(i));
         connect(optData[i], &QRadioButton::clicked, this, [this, i] { optData_Click(i); });

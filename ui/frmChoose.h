@@ -4,6 +4,7 @@
 // -99, closing by the title bar leaves iChoice as it stands.
 #include <QDialog>
 
+#include "requests/Measures.h"
 #include "requests/UiServices.h"
 
 class QRadioButton;
@@ -17,7 +18,7 @@ public:
     explicit frmChoose(ChoiceDialog kind, QWidget* parent = nullptr);
 
     int16_t iChoice = 0;
-    QRadioButton* optData[7] = {};
+    QRadioButton* optData[requests::kMeasures.size()] = {};  // one per measure
     QPushButton* Command1 = nullptr;  // OK
     QPushButton* Command2 = nullptr;  // Cancel
 

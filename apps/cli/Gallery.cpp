@@ -10,6 +10,7 @@
 
 #include "apps/cli/Commands.h"
 #include "apps/cli/RequestRunner.h"
+#include "chart/ChartStyle.h"
 #include "core/Convert.h"
 #include "core/Error.h"
 #include "host/HostObjects.h"
@@ -67,17 +68,15 @@ std::vector<Chart> galleryCharts(const kg::teststand::SampleTotals& totals)
 void storeStyle(const Style& style)
 {
     kg::Variant settings(kg::host::hostObjectFactory()->create(kg::host::HostClass::Settings));
-    auto write = [&](const char* key, const std::string& value) {
-        kg::Args a{kg::Variant("2dCharts"), kg::Variant(key), kg::Variant(value),
-                   kg::Variant(kg::teststand::config().settingsOwner), kg::Variant(std::string())};
-        kg::call(settings, "WriteSetting", a);
-    };
-    write("View3D", kg::numberText(style.view3D ? 1.0 : 0.0));
-    write("Rotation", kg::numberText(20.0));
-    write("Elevation", kg::numberText(15.0));
-    write("Depth", kg::numberText(10.0));
-    write("Style", style.type);
-    write("LabelsOnDefault", style.labels ? "1" : "0");
+    const kg::Variant owner(kg::teststand::config().settingsOwner);
+    using kg::chartstyle::Key;
+    auto write = [&](Key key, const std::string& value) { kg::chartstyle::writeAs(settings, owner, key, value); };
+    write(Key::View3D, kg::numberText(style.view3D ? 1.0 : 0.0));
+    write(Key::Rotation, kg::numberText(20.0));
+    write(Key::Elevation, kg::numberText(15.0));
+    write(Key::Depth, kg::numberText(10.0));
+    write(Key::Style, style.type);
+    write(Key::LabelsOnDefault, style.labels ? "1" : "0");
 }
 
 std::string html(const std::string& s)

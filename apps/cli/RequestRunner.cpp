@@ -24,13 +24,6 @@ namespace {
 
 ui::ScriptedPrompter* g_prompter = nullptr;
 
-const Operation* operationOf(const std::string& name)
-{
-    for (const Operation& op : kOperations)
-        if (equalsNoCase(op.name, name)) return &op;
-    return nullptr;
-}
-
 // Answers the data choice dialog as a user would: click the option, then OK (or Cancel).
 ui::ScriptedPrompter::Answer choiceAnswer(int16_t choice)
 {
@@ -46,11 +39,7 @@ ui::ScriptedPrompter::Answer choiceAnswer(int16_t choice)
     };
 }
 
-const char* gridOf(const std::string& request)
-{
-    const char last = request.empty() ? '1' : request.back();
-    return last == '2' ? "grid2" : last == '3' ? "grid3" : "grid1";
-}
+const char* gridOf(const std::string& request) { return findOperation(request)->grid; }
 
 }  // namespace
 
@@ -76,20 +65,20 @@ void shutdownComponent()
 
 bool isRequestName(const std::string& name)
 {
-    const Operation* op = operationOf(name);
+    const Operation* op = findOperation(name);
     return op && std::strncmp(op->name, "GenerateChart_", 14) == 0;
 }
 
 bool takesGridArguments(const std::string& request)
 {
-    const Operation* op = operationOf(request);
-    return op && op->kind == OperationKind::Method && op->parameters[0] != '\0';
+    const Operation* op = findOperation(request);
+    return op && op->arguments == ArgumentShape::SeriesAndTotal;
 }
 
-bool isMeasureRequest(const std::string& r)
+bool isMeasureRequest(const std::string& request)
 {
-    return equalsNoCase(r, "GenerateChart_BookingsReport") || equalsNoCase(r, "GenerateChart_SalesDeclaration") ||
-           equalsNoCase(r, "GenerateChart_ServCatSumm");
+    const Operation* op = findOperation(request);
+    return op && op->measureChoice;
 }
 
 RequestResult runRequest(const Variant& form, const RequestCall& c)
@@ -100,7 +89,7 @@ RequestResult runRequest(const Variant& form, const RequestCall& c)
     try {
         auto graph = makeRef<cTavixGraph>();
         Args sourceForm{form};
-        graph->invoke(0x68030008, kPropertyPutRef, sourceForm);
+        graph->invoke(operationNamed("SourceForm").id, kPropertyPutRef, sourceForm);
         Args args;
         if (takesGridArguments(c.request)) {
             int32_t series = 0;

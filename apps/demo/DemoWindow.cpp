@@ -149,8 +149,8 @@ void DemoWindow::runRequest(const ReportRequest& request)
     if (request.grid) {
         const ReportTotals totals = form_->totals();
         const QString grid = QString::fromLatin1(request.grid);
-        const double vTotal = grid == "grid1" ? totals.quantity : grid == "grid2" ? totals.value : totals.average;
-        out = client_.request(request.dispid, form_->dataRows(grid), vTotal);
+        const double total = grid == "grid1" ? totals.quantity : grid == "grid2" ? totals.value : totals.average;
+        out = client_.request(request.dispid, form_->dataRows(grid), total);
     } else {
         out = client_.request(request.dispid);
     }

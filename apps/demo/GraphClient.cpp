@@ -92,15 +92,15 @@ Outcome GraphClient::setSourceForm(KGObject* form)
 
 Outcome GraphClient::request(int32_t dispid) { return invoke(dispid, KG_DISPATCH_METHOD, nullptr, 0); }
 
-Outcome GraphClient::request(int32_t dispid, int32_t lNumSeries, double vTotal)
+Outcome GraphClient::request(int32_t dispid, int32_t numSeries, double total)
 {
     KGVariant args[2];
     loaded_.api().VariantInit(&args[0]);
     loaded_.api().VariantInit(&args[1]);
     args[0].vt = KG_VT_I4;
-    args[0].lVal = lNumSeries;
+    args[0].lVal = numSeries;
     args[1].vt = KG_VT_R8;
-    args[1].dblVal = vTotal;
+    args[1].dblVal = total;
     const Outcome out = invoke(dispid, KG_DISPATCH_METHOD, args, 2);
     // By reference: whatever the component wrote back is ours to free.
     loaded_.api().VariantClear(&args[0]);

@@ -44,7 +44,7 @@ public:
     // A request without arguments.
     Outcome request(int32_t dispid);
     // A grid request: lNumSeries and vTotal.
-    Outcome request(int32_t dispid, int32_t lNumSeries, double vTotal);
+    Outcome request(int32_t dispid, int32_t numSeries, double total);
 
 private:
     Outcome invoke(int32_t dispid, uint16_t flags, KGVariant* args, uint32_t argc);

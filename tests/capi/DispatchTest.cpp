@@ -99,8 +99,8 @@ TEST_P(RefusedCallTest, FailsWithTheDispatchStatus)
 
 INSTANTIATE_TEST_SUITE_P(
     Cases, RefusedCallTest,
-    ::testing::Values(RefusedCall{"UnknownDispatchId", 0x60030017, KG_DISPATCH_METHOD, KG_VT_EMPTY, 0,
-                                  KG_E_MEMBERNOTFOUND, 438},
+    ::testing::Values(RefusedCall{"UnknownDispatchId", KG_DISPID_GENERATECHART_HOURLYGRAPH3 + 1, KG_DISPATCH_METHOD,
+                                  KG_VT_EMPTY, 0, KG_E_MEMBERNOTFOUND, 438},
                       RefusedCall{"StandardDispatchIdZero", 0, KG_DISPATCH_METHOD, KG_VT_EMPTY, 0, KG_E_MEMBERNOTFOUND,
                                   438},
                       RefusedCall{"ArgumentOfUnknownType", KG_DISPID_SOURCEFORM, KG_DISPATCH_PROPERTYPUT, 77, 1,

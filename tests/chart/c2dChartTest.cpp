@@ -200,8 +200,8 @@ TEST_F(ChartFixture, DrawChartWritesZeroIntoEmptyCellsAndKeepsTexts)
     EXPECT_EQ(control->chartArea.x.presentationCode, 1);
     EXPECT_EQ(control->chartArea.x.annotationMethod, 2);
     EXPECT_EQ(control->legend.placement, 17);
-    EXPECT_EQ(control->legend.layout1, 10);
-    EXPECT_EQ(control->legend.layout2, 10);
+    EXPECT_EQ(control->legend.gapToPlot, 10);
+    EXPECT_EQ(control->legend.gapBetween, 10);
 
     chart->DrawChart(t);  // a second draw sees the zeros and draws the same chart
     EXPECT_EQ(d.y(2, 3), 0);
@@ -234,7 +234,6 @@ TEST_P(ValueLabels, NameAndTextFollowTheNumberText)
     EXPECT_EQ(l.border, 4);
     EXPECT_EQ(l.borderWidth, 1);
     EXPECT_EQ(l.backgroundColor, 65535u);
-    EXPECT_FALSE(l.isBatched);
 }
 
 INSTANTIATE_TEST_SUITE_P(Table, ValueLabels,
@@ -368,26 +367,12 @@ TEST_F(ChartFixture, PrintChartPassesTheFixedOptions)
     });
     chart->PrintChart();
     EXPECT_EQ(calls, 1);
-    EXPECT_EQ(seen.a1, 3);
-    EXPECT_EQ(seen.a2, 4);
-    EXPECT_EQ(seen.a3 + seen.a4 + seen.a5 + seen.a6, 0);
+    EXPECT_EQ(seen.format, 3);
+    EXPECT_EQ(seen.scale, 4);
+    EXPECT_EQ(seen.left + seen.top + seen.width + seen.height, 0);
 
     control->setPrintHandler(nullptr);
     expectError([&] { chart->PrintChart(); }, errc::PrinterError);
-}
-
-TEST_F(ChartFixture, DispatchReachesPropertiesByName)
-{
-    Variant c(chart);
-    put(c, "numseries", Variant(int32_t(4)));
-    EXPECT_EQ(chart->NumSeries(), 4);
-    put(c, "ChartHeader", Variant("Head"));
-    EXPECT_EQ(toText(call(c, "CHARTHEADER")), "Head");
-    put(c, "YMinData", Variant(int32_t(-2)));
-    EXPECT_EQ(toLong(call(c, "YMinData")), -2);
-    put(c, "ShowLegend", Variant(true));
-    EXPECT_TRUE(c2dChart::ShowLegend());
-    EXPECT_THROW(call(c, "NoSuchMember"), Error);
 }
 
 }  // namespace

@@ -23,8 +23,6 @@ namespace {
 
 namespace stand = teststand;
 
-constexpr DispId kYearly1 = 0x60030009, kProp1 = 0x60030011, kHourly1 = 0x60030014;
-constexpr DispId kBookings = 0x6003000C, kJobStatus = 0x6003000E;
 
 // ---- Form text -------------------------------------------------------------------------------
 
@@ -171,14 +169,19 @@ INSTANTIATE_TEST_SUITE_P(
     Table, GridShapes,
     ::testing::Values(
         // Hourly charts columns 1..cols-2: with fewer than 3 columns there is no point to chart.
-        ShapeCase{"zeroColumnsHourly", kHourly1, 2, 0, 2, {errc::SubscriptOutOfRange, "0 To -2"}},
-        ShapeCase{"zeroColumnsProp", kProp1, 2, 0, 2, {errc::SubscriptOutOfRange, "grid1.textmatrix(1, 0)"}},
-        ShapeCase{"oneColumnHourly", kHourly1, 2, 1, 2, {errc::SubscriptOutOfRange, "0 To -1"}},
-        ShapeCase{"oneColumnYearly", kYearly1, 2, 1, 2, {errc::SubscriptOutOfRange, "grid1.textmatrix(0, 1)"}},
-        ShapeCase{"tenThousandColumnsHourly", kHourly1, 2, 10000, 2, kCharts},
-        ShapeCase{"hundredThousandRowsAsSeries", kHourly1, 100000, 3, 100000, kCharts},
+        ShapeCase{"zeroColumnsHourly", KG_DISPID_GENERATECHART_HOURLYGRAPH1, 2, 0, 2, {errc::SubscriptOutOfRange,
+                  "0 To -2"}},
+        ShapeCase{"zeroColumnsProp", KG_DISPID_GENERATECHART_PROPGRAPH1, 2, 0, 2, {errc::SubscriptOutOfRange,
+                  "grid1.textmatrix(1, 0)"}},
+        ShapeCase{"oneColumnHourly", KG_DISPID_GENERATECHART_HOURLYGRAPH1, 2, 1, 2, {errc::SubscriptOutOfRange,
+                  "0 To -1"}},
+        ShapeCase{"oneColumnYearly", KG_DISPID_GENERATECHART_YEARLYRPT1, 2, 1, 2, {errc::SubscriptOutOfRange,
+                  "grid1.textmatrix(0, 1)"}},
+        ShapeCase{"tenThousandColumnsHourly", KG_DISPID_GENERATECHART_HOURLYGRAPH1, 2, 10000, 2, kCharts},
+        ShapeCase{"hundredThousandRowsAsSeries", KG_DISPID_GENERATECHART_HOURLYGRAPH1, 100000, 3, 100000, kCharts},
         // More rows than lNumSeries: the row beyond the table is out of its range.
-        ShapeCase{"hundredThousandRowsTwoSeries", kHourly1, 100000, 3, 2, {errc::SubscriptOutOfRange, "(3, 1)"}}),
+        ShapeCase{"hundredThousandRowsTwoSeries", KG_DISPID_GENERATECHART_HOURLYGRAPH1, 100000, 3, 2,
+                  {errc::SubscriptOutOfRange, "(3, 1)"}}),
     [](const auto& info) { return std::string(info.param.name); });
 
 TEST_F(EdgeFixture, HundredThousandRowsOfQuoteTypesChartAsPoints)
@@ -187,7 +190,7 @@ TEST_F(EdgeFixture, HundredThousandRowsOfQuoteTypesChartAsPoints)
             ", \"dtpFromDate\": \"2026-01-01\", \"dtpToDate\": \"2026-01-31\"}");
     ui->choices = {0};
     PeakMemory peak;
-    expectOutcome(kBookings, {}, kCharts);
+    expectOutcome(KG_DISPID_GENERATECHART_BOOKINGSREPORT, {}, kCharts);
     EXPECT_EQ(modMain::goChart->NumPoints(), 100000);
     expectPaints();
     EXPECT_LT(peak.growthMb(), 512);
@@ -196,7 +199,7 @@ TEST_F(EdgeFixture, HundredThousandRowsOfQuoteTypesChartAsPoints)
 TEST_F(EdgeFixture, GridWithoutRowsIsNoData)
 {
     setForm(R"({"grid1": {"cells": []}})");
-    ASSERT_EQ(request(kHourly1, {Variant(int32_t(2)), Variant(1.0)}), 0) << lastError;
+    ASSERT_EQ(request(KG_DISPID_GENERATECHART_HOURLYGRAPH1, {Variant(int32_t(2)), Variant(1.0)}), 0) << lastError;
     EXPECT_EQ(ui->messages, std::vector<std::string>{"There is no data to work with"});
     EXPECT_EQ(ui->mousePointer(), kPointerDefault);
 }
@@ -223,7 +226,7 @@ TEST_P(BigCells, ChartOrFailWithAShortDescription)
                                            if (r == c.row && col == c.col) return c.text;
                                            return std::nullopt;
                                        }});
-    expectOnGrid(grid, kHourly1, {Variant(int32_t(2)), Variant(10.0)}, c.expected);
+    expectOnGrid(grid, KG_DISPID_GENERATECHART_HOURLYGRAPH1, {Variant(int32_t(2)), Variant(10.0)}, c.expected);
 }
 
 INSTANTIATE_TEST_SUITE_P(
@@ -238,7 +241,7 @@ INSTANTIATE_TEST_SUITE_P(
 TEST_F(EdgeFixture, MegabyteTotalFailsWithAShortDescription)
 {
     setForm("{\"grid1\": " + test::gridJson(1, 2, 14) + "}");
-    expectOutcome(kHourly1, {Variant(int32_t(2)), Variant(std::string(1 << 20, '7') + "x")},
+    expectOutcome(KG_DISPID_GENERATECHART_HOURLYGRAPH1, {Variant(int32_t(2)), Variant(std::string(1 << 20, '7') + "x")},
                   {errc::TypeMismatch, "is not a number"});
 }
 
@@ -290,7 +293,7 @@ TEST_P(Captions, AreDrawnExportedAndEscaped)
                                            return std::nullopt;
                                        }});
     setForm("{\"grid1\": " + grid + "}");
-    expectOutcome(kHourly1, {Variant(int32_t(2)), Variant(10.0)}, kCharts);
+    expectOutcome(KG_DISPID_GENERATECHART_HOURLYGRAPH1, {Variant(int32_t(2)), Variant(10.0)}, kCharts);
     EXPECT_EQ(chart1().group1.seriesLabels.at(0), caption);  // the caption reaches the chart as it is
     EXPECT_EQ(chart1().group1.pointLabels.at(1), caption);
     expectPaints();
@@ -356,7 +359,7 @@ TEST_P(DateLimits, JobStatusCountsTheJobsAtTheLimits)
     stand::config().jobsDatabase = database;
     setForm(std::string("{\"dtpFromDate\": \"") + c.from + "\", \"dtpToDate\": \"" + c.to +
             "\", \"cboFields\": {\"1\": [\"a\", \"b\"]}}");
-    ASSERT_EQ(request(kJobStatus), 0) << lastError;
+    ASSERT_EQ(request(KG_DISPID_GENERATECHART_JOBSTATUSREPORT), 0) << lastError;
     EXPECT_EQ(ui->mousePointer(), kPointerDefault);
     ASSERT_TRUE(ui->messages.empty()) << ui->messages.front();
     EXPECT_EQ(chart1().chartArea.x.title, c.xTitle);
@@ -392,14 +395,19 @@ const int32_t kLongMax = 2147483647;
 INSTANTIATE_TEST_SUITE_P(
     Table, SeriesCounts,
     ::testing::Values(
-        SeriesCase{"minusOneYearly", kYearly1, Variant(int32_t(-1)), {errc::InvalidProcedureCall, "series count -1"}},
+        SeriesCase{"minusOneYearly", KG_DISPID_GENERATECHART_YEARLYRPT1, Variant(int32_t(-1)),
+                   {errc::InvalidProcedureCall, "series count -1"}},
         // No series in the table: the first row's values have nowhere to go.
-        SeriesCase{"zeroHourly", kHourly1, Variant(int32_t(0)), {errc::SubscriptOutOfRange, "(1, 1)"}},
-        SeriesCase{"zeroProp", kProp1, Variant(int32_t(0)), {errc::SubscriptOutOfRange, "(1, 1)"}},
-        SeriesCase{"longMaxHourly", kHourly1, Variant(kLongMax), {errc::InvalidProcedureCall, "series count 2147483647"}},
-        SeriesCase{"beyondLong", kHourly1, Variant(2147483648.0), {errc::Overflow, "2147483648"}},
-        SeriesCase{"null", kHourly1, Variant::null(), {errc::InvalidUseOfNull, "Null"}},
-        SeriesCase{"text", kHourly1, Variant("many"), {errc::TypeMismatch, "\"many\""}}),
+        SeriesCase{"zeroHourly", KG_DISPID_GENERATECHART_HOURLYGRAPH1, Variant(int32_t(0)),
+                   {errc::SubscriptOutOfRange, "(1, 1)"}},
+        SeriesCase{"zeroProp", KG_DISPID_GENERATECHART_PROPGRAPH1, Variant(int32_t(0)), {errc::SubscriptOutOfRange,
+                   "(1, 1)"}},
+        SeriesCase{"longMaxHourly", KG_DISPID_GENERATECHART_HOURLYGRAPH1, Variant(kLongMax),
+                   {errc::InvalidProcedureCall, "series count 2147483647"}},
+        SeriesCase{"beyondLong", KG_DISPID_GENERATECHART_HOURLYGRAPH1, Variant(2147483648.0), {errc::Overflow,
+                   "2147483648"}},
+        SeriesCase{"null", KG_DISPID_GENERATECHART_HOURLYGRAPH1, Variant::null(), {errc::InvalidUseOfNull, "Null"}},
+        SeriesCase{"text", KG_DISPID_GENERATECHART_HOURLYGRAPH1, Variant("many"), {errc::TypeMismatch, "\"many\""}}),
     [](const auto& info) { return std::string(info.param.name); });
 
 // With value labels on by default every cell of the table gets a label, so a series count far
@@ -411,7 +419,7 @@ TEST_F(EdgeFixture, SeriesCountFarBeyondTheRowsWithValueLabelsStaysBounded)
     writeSetting("LabelsOnDefault", "1");
     setForm("{\"grid1\": " + test::gridJson(1, 2, 14) + "}");
     PeakMemory peak;
-    const int32_t number = request(kHourly1, {Variant(int32_t(1 << 16)), Variant(10.0)});
+    const int32_t number = request(KG_DISPID_GENERATECHART_HOURLYGRAPH1, {Variant(int32_t(1 << 16)), Variant(10.0)});
     EXPECT_TRUE(number == 0 || number == errc::OutOfMemory) << number << ": " << lastError;
     EXPECT_EQ(ui->mousePointer(), kPointerDefault);
     EXPECT_LT(peak.growthMb(), 100) << "MB for a grid of 2 rows (value labels: "

@@ -27,14 +27,21 @@ struct RequestCase {
 
 // A measure-choice request walks once with a one-measure and once with a two-measure choice.
 const RequestCase kRequests[] = {
-    {"YearlyRpt1", 0x60030009, true, kNoChoice},       {"YearlyRpt2", 0x6003000A, true, kNoChoice},
-    {"YearlyRpt3", 0x6003000B, true, kNoChoice},       {"BookingsReport", 0x6003000C, false, 0},
-    {"BookingsReportDual", 0x6003000C, false, 5},      {"SalesDeclaration", 0x6003000D, false, 3},
-    {"JobStatusReport", 0x6003000E, false, kNoChoice}, {"GraphInitialize", 0x6003000F, false, kNoChoice},
-    {"ServCatSumm", 0x60030010, false, 6},             {"PropGraph1", 0x60030011, true, kNoChoice},
-    {"PropGraph2", 0x60030012, true, kNoChoice},       {"PropGraph3", 0x60030013, true, kNoChoice},
-    {"HourlyGraph1", 0x60030014, true, kNoChoice},     {"HourlyGraph2", 0x60030015, true, kNoChoice},
-    {"HourlyGraph3", 0x60030016, true, kNoChoice},
+    {"YearlyRpt1", KG_DISPID_GENERATECHART_YEARLYRPT1, true, kNoChoice},       {"YearlyRpt2",
+     KG_DISPID_GENERATECHART_YEARLYRPT2, true, kNoChoice},
+    {"YearlyRpt3", KG_DISPID_GENERATECHART_YEARLYRPT3, true, kNoChoice},       {"BookingsReport",
+     KG_DISPID_GENERATECHART_BOOKINGSREPORT, false, 0},
+    {"BookingsReportDual", KG_DISPID_GENERATECHART_BOOKINGSREPORT, false, 5},      {"SalesDeclaration",
+     KG_DISPID_GENERATECHART_SALESDECLARATION, false, 3},
+    {"JobStatusReport", KG_DISPID_GENERATECHART_JOBSTATUSREPORT, false, kNoChoice}, {"GraphInitialize",
+     KG_DISPID_GRAPHINITIALIZE, false, kNoChoice},
+    {"ServCatSumm", KG_DISPID_GENERATECHART_SERVCATSUMM, false, 6},             {"PropGraph1",
+     KG_DISPID_GENERATECHART_PROPGRAPH1, true, kNoChoice},
+    {"PropGraph2", KG_DISPID_GENERATECHART_PROPGRAPH2, true, kNoChoice},       {"PropGraph3",
+     KG_DISPID_GENERATECHART_PROPGRAPH3, true, kNoChoice},
+    {"HourlyGraph1", KG_DISPID_GENERATECHART_HOURLYGRAPH1, true, kNoChoice},     {"HourlyGraph2",
+     KG_DISPID_GENERATECHART_HOURLYGRAPH2, true, kNoChoice},
+    {"HourlyGraph3", KG_DISPID_GENERATECHART_HOURLYGRAPH3, true, kNoChoice},
 };
 
 std::string goodForm()
@@ -80,7 +87,7 @@ protected:
     {
         modMain::releaseSharedObjects();
         Args a{form_};
-        graph->invoke(0x68030008, kPropertyPut, a);
+        graph->invoke(KG_DISPID_SOURCEFORM, kPropertyPut, a);
         scriptChoice();
     }
     void scriptChoice()
@@ -101,7 +108,7 @@ protected:
     {
         if (const int32_t n = runRequest()) return "error " + std::to_string(n) + ": " + lastError;
         if (!ui->messages.empty()) return "message box: " + ui->messages.back();
-        if (GetParam().id != 0x6003000F && !(modMain::gfChart && modMain::gfChart->isShown())) return "no chart shown";
+        if (GetParam().id != KG_DISPID_GRAPHINITIALIZE && !(modMain::gfChart && modMain::gfChart->isShown())) return "no chart shown";
         if (ui->mousePointer() != kPointerDefault) return "the pointer stays an hourglass";
         return {};
     }
@@ -160,7 +167,7 @@ TEST_P(OperationList, RequestsReachTheListedOperations)
     test::countFailurePoints([this] { prepare(); }, [this] { return charted(); }, &reached);
     for (const char* op : {"Factory.AppServices", "Factory.JobData", "Factory.HostAux", "Factory.Settings"})
         EXPECT_NE(std::find(reached.begin(), reached.end(), op), reached.end()) << op;
-    if (GetParam().id == 0x6003000E) {
+    if (GetParam().id == KG_DISPID_GENERATECHART_JOBSTATUSREPORT) {
         for (const char* op : {"AppServices.CellToText", "AppServices.CellToNumberText", "JobData.SetFromDate",
                                "JobData.SetToDate", "JobData.GetJobQuery", "JobData.FetchJobRows", "Form.dtpFromDate",
                                "Form.dtpToDate", "Form.cboFields", "Picker.Value", "List.ListCount", "List.List",

@@ -30,7 +30,6 @@ namespace {
 namespace stand = teststand;
 using stand::FaultPlan;
 
-constexpr DispId kHourly1 = 0x60030014, kBookings = 0x6003000C;
 
 // Failure points that are not the fault plan's.
 const test::FailurePoint kPrinterFails{"the printer", 1};
@@ -116,7 +115,7 @@ public:
         closeWindow();
         modMain::releaseSharedObjects();
         Args a{form_};
-        graph->invoke(0x68030008, kPropertyPut, a);
+        graph->invoke(KG_DISPID_SOURCEFORM, kPropertyPut, a);
     }
     void hourlyShown()
     {
@@ -127,13 +126,14 @@ public:
     {
         noChart();
         prompts_->answers.push_back(choose(0));
-        ASSERT_EQ(request(kBookings), 0) << lastError;
+        ASSERT_EQ(request(KG_DISPID_GENERATECHART_BOOKINGSREPORT), 0) << lastError;
     }
 
     std::string hourlyRequest()
     {
         Args args{Variant(int32_t(2)), Variant(10.0)};
-        if (const int32_t n = request(kHourly1, args)) return "Error " + std::to_string(n) + ": " + lastError;
+        if (const int32_t n = request(KG_DISPID_GENERATECHART_HOURLYGRAPH1,
+            args)) return "Error " + std::to_string(n) + ": " + lastError;
         if (!window() || !window()->isVisible()) return "no chart window shown";
         return {};
     }
@@ -277,7 +277,7 @@ TEST_P(WindowWalk, EveryFailurePointIsReportedAndLeavesAWorkingComponent)
             if (!retry.empty()) report.add(p, "the command fails when given again: " + retry);
         }
         Args none{form_};
-        graph->invoke(0x68030008, kPropertyPut, none);
+        graph->invoke(KG_DISPID_SOURCEFORM, kPropertyPut, none);
         const std::string next = hourlyRequest();
         if (!next.empty()) report.add(p, "the next request fails: " + next);
         if (qt_->mousePointer() != kPointerDefault) report.add(p, "the next request leaves the hourglass");

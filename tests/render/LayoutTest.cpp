@@ -84,7 +84,7 @@ TEST_P(LegendPlacementTest, EastOfThePlotVerticallyCentredWithoutOverlaps)
     if (L.legend.isEmpty()) return;
     EXPECT_EQ(L.legendItems.size() < size_t(GetParam().series), GetParam().truncated);
     EXPECT_EQ(L.legendItems.back().text == QStringLiteral("\u2026"), GetParam().truncated);
-    EXPECT_GE(L.legend.left(), L.chartArea.right() + c.legend.layout1 - 0.5);
+    EXPECT_GE(L.legend.left(), L.chartArea.right() + c.legend.gapToPlot - 0.5);
     EXPECT_NEAR(L.legend.center().y(), L.chartArea.center().y(), 0.5);
     EXPECT_LE(L.legend.right(), GetParam().target.right());
     EXPECT_GE(L.legend.top(), L.chartArea.top() - 0.5);

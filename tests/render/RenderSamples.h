@@ -76,7 +76,6 @@ inline void fillPie(ChartControl& c, const std::vector<double>& slices)
 inline ChartLabel& addValueLabel(ChartControl& c, int32_t series, int32_t point, const std::string& text)
 {
     ChartLabel& l = c.addChartLabel();
-    l.isBatched = true;
     l.name = "LB " + text;
     l.text = text;
     l.attachMethod = 2;
@@ -88,7 +87,6 @@ inline ChartLabel& addValueLabel(ChartControl& c, int32_t series, int32_t point,
     l.border = 4;
     l.borderWidth = 1;
     l.backgroundColor = 65535;
-    l.isBatched = false;
     return l;
 }
 

@@ -8,8 +8,6 @@
 namespace kg {
 namespace {
 
-constexpr DispId kJobStatus = 0x6003000E;
-
 struct Job {
     const char* date;
     const char* status;  // f26; nullptr for NULL
@@ -67,7 +65,7 @@ TEST_F(JobStatusFixture, CountsEveryCategoryOnItsOwn)
     });
     setJobForm("2026-02-01", "2026-02-28", 13);
     modMain::giChartKind = 2;
-    ASSERT_EQ(request(kJobStatus), 0) << lastError;
+    ASSERT_EQ(request(KG_DISPID_GENERATECHART_JOBSTATUSREPORT), 0) << lastError;
     const double expected[14] = {0, 1, 0, 1, 0, 1, 2, 2, 1, 1, 1, 1, 1, 1};
     for (int p = 1; p <= 13; ++p) EXPECT_EQ(count(p), expected[p]) << "point " << p;
     EXPECT_EQ(modMain::giChartKind, 2);  // untouched
@@ -89,7 +87,8 @@ TEST_F(JobStatusFixture, ReversedDatesAskTheHostNothing)
 {
     teststand::config().jobsDatabase = dir.filePath("does-not-exist.db").toStdString();
     setJobForm("2026-05-06", "2026-05-05", 13);
-    EXPECT_EQ(request(kJobStatus), 0) << lastError;  // a query would have failed on the missing file
+    EXPECT_EQ(request(KG_DISPID_GENERATECHART_JOBSTATUSREPORT),
+              0) << lastError;  // a query would have failed on the missing file
     EXPECT_EQ(ui->messages, std::vector<std::string>{"The FromDate must be less than or equal to the ToDate"});
     EXPECT_EQ(uiServices().mousePointer(), kPointerDefault);
 }
@@ -98,7 +97,7 @@ TEST_F(JobStatusFixture, NoJobsShowsTheMessageAndNoWindow)
 {
     makeDatabase({{"2026-01-01", "Confirmed"}});
     setJobForm("2026-06-01", "2026-06-30", 13);
-    EXPECT_EQ(request(kJobStatus), 0) << lastError;
+    EXPECT_EQ(request(KG_DISPID_GENERATECHART_JOBSTATUSREPORT), 0) << lastError;
     EXPECT_EQ(ui->messages, std::vector<std::string>{"No jobs were found in that date range"});
     EXPECT_FALSE(modMain::gfChart->isShown());
     EXPECT_EQ(uiServices().mousePointer(), kPointerDefault);
@@ -117,7 +116,7 @@ TEST_P(FieldLists, EveryCategoryHasAPoint)
 {
     makeDatabase({{"2026-02-01", "Imported"}, {"2026-02-01", "Unconfirmed"}});
     setJobForm("2026-02-01", "2026-02-01", GetParam().captions);
-    ASSERT_EQ(request(kJobStatus), 0) << lastError;
+    ASSERT_EQ(request(KG_DISPID_GENERATECHART_JOBSTATUSREPORT), 0) << lastError;
     EXPECT_EQ(modMain::goChart->NumPoints(), GetParam().points);
     EXPECT_EQ(chart1().data().pointCount(1), GetParam().points);
     EXPECT_EQ(chart1().group1.pointLabels.size(), size_t(GetParam().captions));

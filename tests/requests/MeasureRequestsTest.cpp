@@ -7,8 +7,6 @@
 namespace kg {
 namespace {
 
-constexpr DispId kBookings = 0x6003000C, kSales = 0x6003000D, kServCat = 0x60030010;
-
 const char* kSettingsGrid =
     "{\"gridsettings1\": {\"fixedRows\": 1, \"cells\": ["
     "[\"Quote Type\", \"Qty\", \"Value\", \"Avg Value\", \"Pct Jobs\", \"Pct Value\"],"
@@ -56,7 +54,7 @@ TEST_P(Choices, DrawTheChosenMeasure)
     }
     EXPECT_EQ(chart.legend.isShown, c.series.size() == 2);
     EXPECT_TRUE(modMain::gfChart->isRedrawVisible());
-    EXPECT_EQ(modMain::giChartKind, c.request == kBookings ? 1 : 2);
+    EXPECT_EQ(modMain::giChartKind, c.request == KG_DISPID_GENERATECHART_BOOKINGSREPORT ? 1 : 2);
     ASSERT_EQ(modMain::gvArray.upper(0), int32_t(c.series.size()));
     for (size_t s = 0; s < c.series.size(); ++s)
         for (size_t p = 0; p < 3; ++p) {
@@ -90,11 +88,14 @@ std::vector<ChoiceCase> choiceCases()
     };
     const char* captions[] = {"Quote Type", "Qty", "Value", "Avg Value", "Pct Jobs", "Pct Value"};
     std::vector<ChoiceCase> cases;
-    const std::pair<DispId, const char*> requests[] = {{kBookings, "bookings"}, {kSales, "sales"}, {kServCat, "servCat"}};
+    const std::pair<DispId, const char*> requests[] = {{KG_DISPID_GENERATECHART_BOOKINGSREPORT, "bookings"},
+                                                       {KG_DISPID_GENERATECHART_SALESDECLARATION, "sales"},
+                                                        {KG_DISPID_GENERATECHART_SERVCATSUMM, "servCat"}};
     for (const auto& [id, name] : requests)
         for (int16_t choice = 0; choice < 7; ++choice) {
             const Row& r = rows[choice];
-            ChoiceCase c{std::string(name) + "Choice" + std::to_string(choice), id, choice, id == kBookings ? r.quoteType : r.category, r.yTitle, {}, {}};
+            ChoiceCase c{std::string(name) + "Choice" + std::to_string(choice), id, choice,
+                         id == KG_DISPID_GENERATECHART_BOOKINGSREPORT ? r.quoteType : r.category, r.yTitle, {}, {}};
             c.series.push_back(columns[r.c1][0]);
             if (r.c2) {
                 c.series.push_back(columns[r.c2][0]);
@@ -113,7 +114,7 @@ TEST_F(MeasureFixture, CancelledChoiceDrawsNothingButKeepsTheCode)
     setForm(kSettingsGrid);
     modMain::giChartKind = 5;
     ui->choices.push_back(kChoiceCancelled);
-    ASSERT_EQ(request(kSales), 0) << lastError;
+    ASSERT_EQ(request(KG_DISPID_GENERATECHART_SALESDECLARATION), 0) << lastError;
     EXPECT_EQ(modMain::giChartKind, 2);
     EXPECT_FALSE(modMain::gfChart->isShown());
     EXPECT_EQ(uiServices().mousePointer(), kPointerDefault);
@@ -125,7 +126,7 @@ TEST_F(MeasureFixture, GridWithoutDataRowsShowsTheMessageBeforeAnyDialog)
     setForm("{\"gridsettings1\": {\"fixedRows\": 1, \"cells\": [[\"Quote Type\", \"Qty\", \"Value\", \"Avg\", \"P1\", "
             "\"P2\"]]}}");
     modMain::giChartKind = 4;
-    ASSERT_EQ(request(kBookings), 0) << lastError;
+    ASSERT_EQ(request(KG_DISPID_GENERATECHART_BOOKINGSREPORT), 0) << lastError;
     EXPECT_EQ(ui->messages, std::vector<std::string>{"There is no data to work with"});
     EXPECT_TRUE(ui->dialogsShown.empty());
     EXPECT_EQ(modMain::giChartKind, 4);
@@ -137,7 +138,7 @@ TEST_F(MeasureFixture, TwoFixedRowsStartAtTheSecondRow)
             "[\"never read\", 99, 99, 99, 99, 99], [\"Retail\", 3, 1, 1, 1, 1], [\"Online\", 7, 1, 1, 1, 1]]},"
             " \"dtpFromDate\": \"2026-01-01\", \"dtpToDate\": \"2026-01-31\"}");
     ui->choices.push_back(0);
-    ASSERT_EQ(request(kBookings), 0) << lastError;
+    ASSERT_EQ(request(KG_DISPID_GENERATECHART_BOOKINGSREPORT), 0) << lastError;
     EXPECT_EQ(chart1().group1.pointLabels, (std::vector<std::string>{"Retail", "Online"}));
     EXPECT_EQ(chart1().data().y(1, 1), 3);
     EXPECT_EQ(chart1().data().y(1, 2), 7);

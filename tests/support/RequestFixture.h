@@ -52,7 +52,7 @@ struct RequestFixture : ::testing::Test {
     void setForm(const std::string& json)
     {
         Args a{Variant(teststand::loadFormJson(json, "test form"))};
-        graph->invoke(0x68030008, kPropertyPut, a);
+        graph->invoke(KG_DISPID_SOURCEFORM, kPropertyPut, a);
     }
     // Invokes by dispatch id; returns the error number (0 on success).
     int32_t request(DispId id, Args args = {})

@@ -5,6 +5,7 @@
 #include <optional>
 #include <string>
 
+#include "chart/ChartStyle.h"
 #include "teststand/FaultPlan.h"
 #include "teststand/SettingsFile.h"
 #include "support/RequestFixture.h"
@@ -36,7 +37,7 @@ struct UiFixture : RequestFixture {
     // the key was never written.
     std::optional<std::string> storedStyle(const std::string& key) const
     {
-        return settingsFile().read("Tavix/2dCharts/" + key);
+        return settingsFile().read(std::string("Tavix/") + chartstyle::kSection + "/" + key);
     }
     // A window placement value, "FormState/<window key>/<member>".
     std::optional<std::string> storedPlacement(const std::string& windowKey, const std::string& member) const

@@ -13,6 +13,7 @@
 #include <sstream>
 #include <tuple>
 
+#include "chart/ChartStyle.h"
 #include "support/FakeHost.h"
 #include "ui/NumericField.h"
 #include "ui/frmChartSetup.h"
@@ -24,7 +25,7 @@ namespace {
 using ui::frmChartSetup;
 using ui::NumericField;
 
-constexpr std::array<const char*, 6> kKeys = {"View3D", "Rotation", "Elevation", "Depth", "Style", "LabelsOnDefault"};
+using chartstyle::kKeys;
 using Stored = std::map<std::string, std::string>;
 using StoredAfter = std::array<std::optional<std::string>, 6>;  // by kKeys; nullopt: never written
 
@@ -94,7 +95,7 @@ struct SetupFixture : UiFixture {
     StoredAfter storedAfter() const
     {
         StoredAfter after;
-        for (size_t i = 0; i < kKeys.size(); ++i) after[i] = storedStyle(kKeys[i]);
+        for (size_t i = 0; i < kKeys.size(); ++i) after[i] = storedStyle(kKeys[i].name);
         return after;
     }
     static ChartState chartState()
@@ -154,7 +155,7 @@ TEST_P(RoundTrip, StoresAndAppliesTheChoice)
     ui::showChartSetup();
     ASSERT_EQ(prompts->dialogsShown, std::vector<std::string>{"frmChartSetup"});
     const StoredAfter after = storedAfter();
-    for (size_t i = 0; i < kKeys.size(); ++i) EXPECT_EQ(after[i], c.after[i]) << kKeys[i];
+    for (size_t i = 0; i < kKeys.size(); ++i) EXPECT_EQ(after[i], c.after[i]) << kKeys[i].name;
     EXPECT_EQ(chartState(), c.chart);
 }
 

@@ -22,8 +22,6 @@
 namespace kg {
 namespace {
 
-constexpr DispId kHourly1 = 0x60030014;
-
 struct WindowFixture : test::RequestFixture {
     ui::ScriptedPrompter* prompts = nullptr;
     ui::QtUi* qtUi = nullptr;
@@ -53,7 +51,7 @@ struct WindowFixture : test::RequestFixture {
         setForm("{\"grid1\": " + test::gridJson(1, 2, 14) + ", \"gridsettings1\": " + test::gridJson(1, 3, 6) +
                 ", \"dtpFromDate\": \"2013-07-01\", \"dtpToDate\": \"2014-06-30\"}");
         Args args{Variant(int32_t(2)), Variant(3.0)};
-        ASSERT_EQ(request(kHourly1, args), 0) << lastError;
+        ASSERT_EQ(request(KG_DISPID_GENERATECHART_HOURLYGRAPH1, args), 0) << lastError;
     }
     std::string eventLog()
     {

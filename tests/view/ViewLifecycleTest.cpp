@@ -9,7 +9,6 @@
 namespace kg::test {
 namespace {
 
-constexpr DispId kHourly1 = 0x60030014;
 using control::test::dragOn;
 
 struct AfterCase {
@@ -24,7 +23,7 @@ protected:
     {
         setForm("{\"grid1\": " + gridJson(1, 3, 8) + "}");
         Args args{Variant(int32_t(3)), Variant(100.0)};
-        ASSERT_EQ(request(kHourly1, args), 0) << lastError;
+        ASSERT_EQ(request(KG_DISPID_GENERATECHART_HOURLYGRAPH1, args), 0) << lastError;
     }
     void TearDown() override
     {
@@ -94,7 +93,7 @@ INSTANTIATE_TEST_SUITE_P(
                       AfterCase{"newRequest",
                                 [](RequestFixture& f) {
                                     Args args{Variant(int32_t(3)), Variant(50.0)};
-                                    ASSERT_EQ(f.request(kHourly1, args), 0) << f.lastError;
+                                    ASSERT_EQ(f.request(KG_DISPID_GENERATECHART_HOURLYGRAPH1, args), 0) << f.lastError;
                                 },
                                 false}),
     control::samples::rowName);

@@ -114,7 +114,6 @@ void ChartControl::print(const PrintRequest& request) const
 
 void ChartControl::changed()
 {
-    ++revision_;
     if (data_.isBatched()) {
         pending_ = true;
         return;

@@ -24,10 +24,24 @@ constexpr int greenOf(OleColor c) { return int((c >> 8) & 0xFF); }
 constexpr int blueOf(OleColor c) { return int((c >> 16) & 0xFF); }
 
 // Chart type codes of chart group 1.
-enum ChartTypeCode : int16_t { kPlot = 1, kBar = 2, kPie = 3, kArea = 5 };
+enum ChartType : int16_t {
+    kPlot = 1,  // lines through the points
+    kBar = 2,   // bars, side by side per point
+    kPie = 3,   // one slice per series
+    kArea = 5,  // lines with the area below filled
+};
 
-// Border style codes (drawn by the painter): 0 none, 1 plain, 2 etched in, 3 etched out,
-// 4 shadow (the chart area's), 5 bevel in, 6 bevel out (the control's).
+// Border style codes of the control, the chart area and the value labels.
+enum BorderStyleCode : int {
+    kBorderNone = 0,
+    kBorderPlain = 1,
+    kBorderEtchedIn = 2,
+    kBorderEtchedOut = 3,
+    kBorderShadow = 4,    // the chart area's and the value labels'
+    kBorderBevelIn = 5,
+    kBorderBevelOut = 6,  // the control's
+};
+
 struct Border {
     int style = 0;
     int width = 0;
@@ -43,8 +57,17 @@ struct Title {
     Font font;
 };
 
-// Axis presentation codes: 1 title horizontal, 2 title rotated to read upwards.
-// Annotation method: 2 the point labels of chart group 1; anything else numbers (point numbers on X).
+// How an axis title is presented.
+enum AxisPresentation : int {
+    kTitleHorizontal = 1,
+    kTitleRotatedUp = 2,  // turned to read upwards
+};
+// What annotates an axis; any code other than kAnnotatePointLabels gives numbers (point numbers on X).
+enum AnnotationMethod : int {
+    kAnnotateValues = 0,
+    kAnnotatePointLabels = 2,  // the point labels of chart group 1
+};
+
 struct Axis {
     std::string title;
     int presentationCode = 1;
@@ -126,10 +149,15 @@ struct ChartGroup {
     std::vector<std::string> seriesLabels;  // legend texts, in order
 };
 
-// A chart label (value label): attached to a data point by series and point index when
-// attachMethod is 2, drawn as a box offset from the point and connected to it.
+// How a chart label is attached; labels attached otherwise are not drawn.
+enum AttachMethod : int {
+    kAttachNone = 0,
+    kAttachToDataPoint = 2,  // by series and point index
+};
+
+// A chart label (value label): attached to a data point, drawn as a box offset from the point and
+// connected to it.
 struct ChartLabel {
-    bool isBatched = false;
     std::string name;
     std::string text;
     int attachMethod = 0;
@@ -138,18 +166,22 @@ struct ChartLabel {
     int anchor = 0;      // 0: automatic placement around the point
     int offset = 0;      // distance from the point, in pixels at 96 dpi
     bool isConnected = false;
-    int border = 0;      // border style code (4: shadow)
+    int border = 0;      // a BorderStyleCode
     int borderWidth = 0;
     OleColor backgroundColor = 0xFFFFFF;
 };
 
-// Legend placement codes: 17 to the east of the plot; the two layout values are the gaps
-// (pixels at 96 dpi) between the legend and the plot, and between entries.
+// Where the legend is placed.
+enum LegendPlacement : int {
+    kLegendEast = 17,  // to the right of the plot, centred
+};
+
+// The legend; the gaps are pixels at 96 dpi.
 struct Legend {
     bool isShown = false;
-    int placement = 17;
-    int layout1 = 10;
-    int layout2 = 10;
+    int placement = kLegendEast;
+    int gapToPlot = 10;     // between the legend and the plot
+    int gapBetween = 10;    // between entries
 };
 
 // Interactive view state: scale, move and graphics zoom of the chart inside the chart area. A
@@ -161,9 +193,18 @@ struct ViewState {
     bool isIdentity() const { return scale == 1.0 && offsetX == 0 && offsetY == 0; }
 };
 
-// Print options as the print operation receives them.
+// The codes the chart object prints with: our printer ignores them and always fits the chart,
+// as it is shown, to one landscape page.
+enum PrintCode : int32_t {
+    kPrintFormatChart = 3,  // the format the chart object asks for
+    kPrintScaleChart = 4,   // the scaling the chart object asks for
+};
+
+// Print options as the print operation receives them; a zero rectangle is the whole page.
 struct PrintRequest {
-    int32_t a1 = 0, a2 = 0, a3 = 0, a4 = 0, a5 = 0, a6 = 0;
+    int32_t format = 0;
+    int32_t scale = 0;
+    int32_t left = 0, top = 0, width = 0, height = 0;
 };
 
 class ChartControl : public RefCounted {
@@ -201,7 +242,6 @@ public:
     // Tell the views that the control changed; held while the data is batched.
     void changed();
     void setChangeListener(std::function<void()> listener) { listener_ = std::move(listener); }
-    uint64_t revision() const { return revision_; }
 
     // Back to automatic scale and position (the "r" key; a new chart).
     void resetView();
@@ -210,7 +250,6 @@ private:
     ChartData data_;
     PrintHandler printHandler_;
     std::function<void()> listener_;
-    uint64_t revision_ = 0;
     bool pending_ = false;
     friend class ChartData;
 };

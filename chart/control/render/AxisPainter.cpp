@@ -99,7 +99,7 @@ void paintYAxis(const PaintContext& ctx)
     if (!L.yTitle.isEmpty()) {
         const QString title = displayText(ctx.chart.chartArea.y.title);
         const MeasuredFont& tf = ctx.fonts.axisTitle;
-        if (ctx.chart.chartArea.y.presentationCode == 2) {
+        if (ctx.chart.chartArea.y.presentationCode == kTitleRotatedUp) {
             // Turned to read upwards, centred along the axis.
             p.save();
             p.translate(L.yTitle.center());

@@ -9,17 +9,6 @@ class QPainter;
 
 namespace kg::control {
 
-// Border style codes as the model stores them.
-enum BorderStyleCode : int {
-    kBorderNone = 0,
-    kBorderPlain = 1,
-    kBorderEtchedIn = 2,
-    kBorderEtchedOut = 3,
-    kBorderShadow = 4,
-    kBorderBevelIn = 5,
-    kBorderBevelOut = 6,
-};
-
 // Room a border takes on each side (a shadow only on the right and bottom; it is counted on all
 // sides so that content stays centred). Unknown codes draw as no border.
 double borderInset(const Border& border);

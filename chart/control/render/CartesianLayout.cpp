@@ -54,7 +54,7 @@ double planXLabels(const ChartControl& chart, ChartLayout& L, const ChartFonts& 
     L.xLabelsRotated = false;
     const double spacing = std::fabs(m.xPixel(smallestStep(L.xPositions)) - m.xPixel(0));
     const double plotW = m.plot.width();
-    if (chart.chartArea.x.annotationMethod == 2) {
+    if (chart.chartArea.x.annotationMethod == kAnnotatePointLabels) {
         const std::vector<std::string>& labels = chart.group1.pointLabels;
         std::vector<AxisLabel> all;
         double widest = 0;
@@ -163,7 +163,7 @@ void placeAxesAndPlot(const ChartControl& chart, ChartLayout& L, const ChartFont
     const MeasuredFont& at = fonts.axisTitle;
     const QString xTitle = displayText(area.x.title);
     const QString yTitle = displayText(area.y.title);
-    const bool yTurned = area.y.presentationCode == 2;
+    const bool yTurned = area.y.presentationCode == kTitleRotatedUp;
     const double yTitleW = yTitle.isEmpty() ? 0 : (yTurned ? at.height + 6 : 0);
     const double yTitleH = (!yTitle.isEmpty() && !yTurned) ? at.height + 4 : 0;
     const double xTitleH = xTitle.isEmpty() ? 0 : at.height + 4;

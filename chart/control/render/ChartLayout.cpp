@@ -24,9 +24,9 @@ LabelRoom valueLabelRoom(const ChartControl& chart, const ChartFonts& fonts, boo
 {
     LabelRoom room;
     for (const ChartLabel& l : chart.chartLabels) {
-        if (l.attachMethod != 2) continue;
+        if (l.attachMethod != kAttachToDataPoint) continue;
         room.any = true;
-        const double border = 2 * std::clamp(double(l.borderWidth), 0.0, 10.0) + (l.border == 4 ? 3 : 0);
+        const double border = 2 * std::clamp(double(l.borderWidth), 0.0, 10.0) + (l.border == kBorderShadow ? 3 : 0);
         room.height = std::max(room.height, fonts.label.height + 2 * kLabelPadY + border);
         const double offset = std::clamp(double(l.offset), 0.0, 200.0);
         room.above = std::max(room.above, offset);

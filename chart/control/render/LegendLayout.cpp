@@ -31,7 +31,7 @@ void placeLegend(const ChartControl& chart, ChartLayout& L, const ChartFonts& fo
     const int n = int(texts.size());
     if (availH < rowH || maxWidth < 2 * kLegendPad + swatch) return;
 
-    double gap = std::clamp(double(chart.legend.layout2), 0.0, 100.0);
+    double gap = std::clamp(double(chart.legend.gapBetween), 0.0, 100.0);
     double widest = 0;
     for (const QString& t : texts) widest = std::max(widest, f.width(t));
 
@@ -59,7 +59,7 @@ void placeLegend(const ChartControl& chart, ChartLayout& L, const ChartFonts& fo
     const double columnW = entryExtra + textW;
     const double width = 2 * kLegendPad + columns * columnW + (columns - 1) * kLegendColumnGap;
     const double height = 2 * kLegendPad + rows * rowH + (rows - 1) * gap;
-    const double gapToPlot = std::clamp(double(chart.legend.layout1), 0.0, 200.0);
+    const double gapToPlot = std::clamp(double(chart.legend.gapToPlot), 0.0, 200.0);
 
     L.legend = QRectF(inner.right() - width, inner.center().y() - height / 2, width, height);
     inner.setRight(L.legend.left() - gapToPlot);

@@ -112,7 +112,7 @@ void paintValueLabels(const PaintContext& ctx)
     const QTransform back = L.view.inverted(&invertible);
     const QRectF inView = invertible ? back.mapRect(L.chartContent) : L.chartContent;
     for (const ChartLabel& label : ctx.chart.chartLabels) {
-        if (label.attachMethod != 2) continue;
+        if (label.attachMethod != kAttachToDataPoint) continue;
         const std::optional<LabelAnchor> anchor = anchorOf(ctx, label);
         if (!anchor || !shown.adjusted(-1, -1, 1, 1).contains(anchor->point)) continue;
         const double offset = std::clamp(double(label.offset), 0.0, kMostOffset);
