@@ -1,6 +1,6 @@
 #include "builders/LateBoundGrid.h"
 #include "requests/Requests.h"
-#include "requests/UiServices.h"
+#include "requests/Services.h"
 #include "requests/modMain.h"
 #include "core/Convert.h"
 #include "core/Error.h"
@@ -88,7 +88,7 @@ void GenerateChart_JobStatusReport()
     const Variant from = builders::datePickerValue(gvSourceForm, "dtpFromDate");
     const Variant to = builders::datePickerValue(gvSourceForm, "dtpToDate");
     if (toDouble(to) < toDouble(from)) {
-        uiServices().messageBox(kDatesReversed);
+        services().prompter->showMessage(kDatesReversed);
         return;
     }
     HourglassOn();
@@ -130,7 +130,7 @@ void GenerateChart_JobStatusReport()
     const int32_t count = toLong(fetch[4]);
     if (count < 1) {
         HourglassOff();
-        uiServices().messageBox(kNoJobs);
+        services().prompter->showMessage(kNoJobs);
         return;
     }
     if (!fetch[1].isArray()) throw Error::typeMismatch("FetchJobRows returned no table of job rows");

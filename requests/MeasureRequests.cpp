@@ -1,7 +1,7 @@
 #include "builders/BookingsBuilders.h"
 #include "builders/LateBoundGrid.h"
 #include "requests/Requests.h"
-#include "requests/UiServices.h"
+#include "requests/Services.h"
 #include "requests/modMain.h"
 
 namespace kg::requests {
@@ -34,7 +34,7 @@ void measureRequest(int16_t chartKind)
     builders::LateBoundGrid grid(call(gvSourceForm, "gridsettings1"));
     const int32_t rows = grid.Rows();
     if (rows == grid.FixedRows()) {
-        uiServices().messageBox(kNoData);
+        services().prompter->showMessage(kNoData);
         return;
     }
     // Stored before the dialog: a cancelled choice still leaves the code.
@@ -47,7 +47,7 @@ void measureRequest(int16_t chartKind)
 bool chooseAndDrawMeasure(int16_t chartKind)
 {
     const bool quoteTypes = chartKind == kBookings;
-    const int16_t iChoice = uiServices().chooseData(quoteTypes ? ChoiceDialog::QuoteType : ChoiceDialog::Category);
+    const int16_t iChoice = services().prompter->chooseData(quoteTypes ? ChoiceDialog::QuoteType : ChoiceDialog::Category);
     if (iChoice == kChoiceCancelled) return false;
     HourglassOn();
     if (iChoice < 0 || iChoice > 6) return true;  // no row of the table matches: nothing is drawn

@@ -4,7 +4,7 @@
 // -99, closing by the title bar leaves iChoice as it stands.
 #include <QDialog>
 
-#include "requests/UiServices.h"
+#include "requests/Services.h"
 
 class QRadioButton;
 class QPushButton;

@@ -12,7 +12,7 @@
 #include "apps/cli/RequestRunner.h"
 #include "core/Convert.h"
 #include "core/Error.h"
-#include "host/HostObjects.h"
+#include "requests/Services.h"
 #include "teststand/SampleData.h"
 #include "teststand/TestStand.h"
 
@@ -66,10 +66,10 @@ std::vector<Chart> galleryCharts(const kg::teststand::SampleTotals& totals)
 
 void storeStyle(const Style& style)
 {
-    kg::Variant settings(kg::host::hostObjectFactory()->create(kg::host::HostClass::Settings));
+    kg::Variant settings(kg::services().hostObjects->create(kg::host::HostClass::Settings));
     auto write = [&](const char* key, const std::string& value) {
         kg::Args a{kg::Variant("2dCharts"), kg::Variant(key), kg::Variant(value),
-                   kg::Variant(kg::teststand::config().settingsOwner), kg::Variant(std::string())};
+                   kg::Variant(kg::teststand::Config().settingsOwner), kg::Variant(std::string())};
         kg::call(settings, "WriteSetting", a);
     };
     write("View3D", kg::numberText(style.view3D ? 1.0 : 0.0));
@@ -140,9 +140,9 @@ int runGallery(int argc, char** argv)
 
     kg::teststand::SampleData sample;
     kg::Ref<kg::Object> form;
+    kg::teststand::Config stand;
     try {
         sample = kg::teststand::writeSampleData(folder + "/sample");
-        auto& stand = kg::teststand::config();
         stand.settingsFile = folder + "/sample/settings.ini";
         QFile::remove(QString::fromStdString(stand.settingsFile));
         stand.jobsDatabase = sample.database;
@@ -151,7 +151,7 @@ int runGallery(int argc, char** argv)
         std::fprintf(stderr, "karstgraph gallery: %s\n", e.description().c_str());
         return 1;
     }
-    kg::cli::installOffscreenComponent();
+    kg::cli::installOffscreenComponent(stand);
 
     const std::vector<Chart> charts = galleryCharts(sample.totals);
     std::vector<Entry> entries;

@@ -40,7 +40,7 @@ class SettingsEntry : public SettingsStore, public ::testing::WithParamInterface
 TEST_P(SettingsEntry, ReadsBackExactlyAndKeepsTheOtherOwners)
 {
     const EntryCase& c = GetParam();
-    const Variant settings(host::hostObjectFactory()->create(host::HostClass::Settings));
+    const Variant settings(services->hostObjects->create(host::HostClass::Settings));
     write(settings, "Neighbour", "Style", "Area");
     write(settings, c.owner, "Style", c.value);
     EXPECT_EQ(read(settings, c.owner, "Style"), c.value);

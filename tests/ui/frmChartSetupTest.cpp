@@ -89,7 +89,7 @@ struct SetupFixture : UiFixture {
     // The next dialog is worked through `script`.
     void answer(std::string script)
     {
-        prompts->answers.push_back([script](QDialog& d) { work(dynamic_cast<frmChartSetup&>(d), script); });
+        prompts.answers.push_back([script](QDialog& d) { work(dynamic_cast<frmChartSetup&>(d), script); });
     }
     StoredAfter storedAfter() const
     {
@@ -152,7 +152,7 @@ TEST_P(RoundTrip, StoresAndAppliesTheChoice)
     store(c.before);
     answer(c.script);
     ui::showChartSetup();
-    ASSERT_EQ(prompts->dialogsShown, std::vector<std::string>{"frmChartSetup"});
+    ASSERT_EQ(prompts.dialogsShown, std::vector<std::string>{"frmChartSetup"});
     const StoredAfter after = storedAfter();
     for (size_t i = 0; i < kKeys.size(); ++i) EXPECT_EQ(after[i], c.after[i]) << kKeys[i];
     EXPECT_EQ(chartState(), c.chart);
@@ -371,7 +371,7 @@ TEST_F(SetupFixture, FailingWriteEndsOkAndLeavesShowChartSetupWithTheError)
 {
     teststand::FaultPlan::failOn("Settings.WriteSetting", 3);  // Elevation
     bool stillOpen = true;
-    prompts->answers.push_back([&](QDialog& d) {
+    prompts.answers.push_back([&](QDialog& d) {
         work(dynamic_cast<frmChartSetup&>(d), "3d ok");
         stillOpen = d.isVisible();
     });
