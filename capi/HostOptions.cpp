@@ -58,7 +58,8 @@ void setOption(const std::string& key, const std::string& value)
                                          "appFolder, eventLogFile, eventLogToStderr, jobsDatabase)"));
     // Host objects created from now on read the new options; a host's own factory stays.
     Services& in = services();
-    if (in.hostObjects && in.hostObjects == standFactory()) in.hostObjects = standFactory() = teststand::makeFactory(cfg);
+    if (in.hostObjects && in.hostObjects == standFactory())
+        in.hostObjects = standFactory() = teststand::makeFactory(cfg);
 }
 
 }  // namespace

@@ -2,8 +2,9 @@
 // fifteen and others), any invoke kind, 0 to 4 arguments of any type (Empty, Null, numbers, dates,
 // texts, Nothing, forms, other objects, arrays nested in arrays), the data choice dialogs answered
 // with any number, several calls in a row on the same shared state. The headless chart window
-// stands in for the windows, a scripted prompter for the dialogs. A call either works or raises kg::Error with a known number and a description, and
-// a failed call leaves the mouse pointer as it found it before the request (default).
+// stands in for the windows, a scripted prompter for the dialogs. A call either works or raises
+// kg::Error with a known number and a description, and a failed call leaves the mouse pointer as it
+// found it before the request (default).
 #include <QCoreApplication>
 #include <QTemporaryDir>
 #include <array>

@@ -47,7 +47,8 @@ void measureRequest(int16_t chartKind)
 bool chooseAndDrawMeasure(int16_t chartKind)
 {
     const bool quoteTypes = chartKind == kBookings;
-    const int16_t iChoice = services().prompter->chooseData(quoteTypes ? ChoiceDialog::QuoteType : ChoiceDialog::Category);
+    const int16_t iChoice =
+        services().prompter->chooseData(quoteTypes ? ChoiceDialog::QuoteType : ChoiceDialog::Category);
     if (iChoice == kChoiceCancelled) return false;
     HourglassOn();
     if (iChoice < 0 || iChoice > 6) return true;  // no row of the table matches: nothing is drawn
