@@ -7,7 +7,7 @@
 #include <QImage>
 
 #include "chart/control/render/ChartExport.h"
-#include "requests/HeadlessUi.h"
+#include "requests/Services.h"
 #include "requests/cTavixGraph.h"
 #include "requests/modMain.h"
 #include "teststand/SampleJobs.h"
@@ -26,7 +26,7 @@ struct Stand {
         teststand::SampleJobsSpec spec;
         spec.count = 100000;
         writeSampleJobs(folder + "/jobs.db", spec);
-        auto& cfg = teststand::config();
+        teststand::Config cfg;
         cfg.jobsDatabase = folder + "/jobs.db";
         cfg.settingsFile = folder + "/settings.ini";
         cfg.appFolder = folder;
@@ -36,7 +36,7 @@ struct Stand {
         form = teststand::loadFormJson(
             "{\"dtpFromDate\": \"2026-03-01\", \"dtpToDate\": \"2026-05-12\", \"cboFields\": {\"1\": [" + list + "]}}",
             "bench form");
-        setUiServices(std::make_unique<HeadlessUi>());
+        services().hostObjects = teststand::makeFactory(cfg);
     }
 };
 
@@ -64,7 +64,7 @@ BENCHMARK(BM_JobStatusRequest)->Unit(benchmark::kMillisecond);
 void BM_JobQueryOnly(benchmark::State& state)
 {
     stand();
-    Variant jobs(host::hostObjectFactory()->create(host::HostClass::JobData));
+    Variant jobs(services().hostObjects->create(host::HostClass::JobData));
     int32_t rows = 0;
     for (auto _ : state) {
         Args from{Variant::date(46082)}, to{Variant::date(46154)};  // 2026-03-01, 2026-05-12

@@ -5,9 +5,8 @@
 #include "requests/cTavixGraph.h"
 #include "capi/Boundary.h"
 #include "capi/Guids.h"
+#include "capi/HostStand.h"
 #include "capi/Objects.h"
-#include "host/HostObjects.h"
-#include "teststand/TestStand.h"
 #include "ui/QtUi.h"
 
 namespace kg::capi {
@@ -42,7 +41,7 @@ int32_t factoryCreateInstance(KGClassFactory*, KGObject** out)
         // A host with a Qt application gets the chart windows; one without keeps the headless UI.
         ui::installQtUiForApplication();
         // A host that registered no library objects of its own gets the test stand's.
-        if (!host::hostObjectFactory()) host::setHostObjectFactory(teststand::makeFactory());
+        installStandUnlessHostHasOne();
         *out = exportObject(makeRef<cTavixGraph>());
         return KG_S_OK;
     });

@@ -3,7 +3,9 @@
 #include <cstring>
 
 #include "capi/Boundary.h"
+#include "capi/HostStand.h"
 #include "capi/Objects.h"
+#include "requests/Services.h"
 #include "teststand/TestStand.h"
 
 namespace kg::capi {
@@ -20,10 +22,23 @@ bool flagValue(const std::string& key, const std::string& value)
                                                       value + "\""));
 }
 
+teststand::Config& standConfig()
+{
+    static teststand::Config cfg;
+    return cfg;
+}
+
+// The factory made with the options as they were last set; the one to replace when they change.
+Ref<host::HostObjectFactory>& standFactory()
+{
+    static Ref<host::HostObjectFactory> factory;
+    return factory;
+}
+
 void setOption(const std::string& key, const std::string& value)
 {
     using teststand::Config;
-    Config& cfg = teststand::config();
+    Config& cfg = standConfig();
     const Config defaults;
     if (key == "settingsFile")
         cfg.settingsFile = value;
@@ -41,9 +56,19 @@ void setOption(const std::string& key, const std::string& value)
         throw Failure(KG_E_INVALIDARG,
                       Error::invalidCall("there is no host option \"" + key + "\" (settingsFile, settingsOwner, "
                                          "appFolder, eventLogFile, eventLogToStderr, jobsDatabase)"));
+    // Host objects created from now on read the new options; a host's own factory stays.
+    Services& in = services();
+    if (in.hostObjects && in.hostObjects == standFactory())
+        in.hostObjects = standFactory() = teststand::makeFactory(cfg);
 }
 
 }  // namespace
+
+void installStandUnlessHostHasOne()
+{
+    Services& in = services();
+    if (!in.hostObjects) in.hostObjects = standFactory() = teststand::makeFactory(standConfig());
+}
 
 }  // namespace kg::capi
 

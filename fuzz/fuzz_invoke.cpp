@@ -1,19 +1,20 @@
 // cTavixGraph through its dispatch surface with whatever a host could send: any dispatch id (the
 // fifteen and others), any invoke kind, 0 to 4 arguments of any type (Empty, Null, numbers, dates,
 // texts, Nothing, forms, other objects, arrays nested in arrays), the data choice dialogs answered
-// with any number, several calls in a row on the same shared state. The headless UI stands in for
-// the windows. A call either works or raises kg::Error with a known number and a description, and
-// a failed call leaves the mouse pointer as it found it before the request (default).
+// with any number, several calls in a row on the same shared state. The headless chart window
+// stands in for the windows, a scripted prompter for the dialogs. A call either works or raises
+// kg::Error with a known number and a description, and a failed call leaves the mouse pointer as it
+// found it before the request (default).
 #include <QCoreApplication>
 #include <QTemporaryDir>
 #include <array>
 
-#include "requests/HeadlessUi.h"
 #include "requests/cTavixGraph.h"
 #include "requests/modMain.h"
 #include "FuzzSupport.h"
 #include "teststand/SampleJobs.h"
 #include "teststand/TestStand.h"
+#include "ui/Prompter.h"
 
 using namespace kg;
 using kg::fuzz::ByteReader;
@@ -106,15 +107,15 @@ public:
 
         Args args;
         for (int n = in_.byte() % 5; n > 0; --n) args.push_back(value(0));
-        ui_->choices.clear();
+        prompts_->choices.clear();
         bool dialogAnswers = true;  // answers the real dialogs can give: 0..6 or Cancel
         for (int n = in_.byte() % 3; n > 0; --n) {
-            ui_->choices.push_back(choice());
-            dialogAnswers = dialogAnswers && ((ui_->choices.back() >= 0 && ui_->choices.back() <= 6) ||
-                                              ui_->choices.back() == kChoiceCancelled);
+            prompts_->choices.push_back(choice());
+            dialogAnswers = dialogAnswers && ((prompts_->choices.back() >= 0 && prompts_->choices.back() <= 6) ||
+                                              prompts_->choices.back() == kChoiceCancelled);
         }
 
-        const int pointerBefore = ui_->mousePointer();
+        const int pointerBefore = services().windows->mousePointer();
         bool known = false;
         for (const Operation& op : kOperations) known = known || op.id == id;
         try {
@@ -122,12 +123,12 @@ public:
             // A request that set the hourglass takes it off again when it ends, except after an
             // answer that no dialog gives.
             if (pointerBefore == kPointerDefault && dialogAnswers)
-                require(ui_->mousePointer() == kPointerDefault, "a call that worked left the hourglass");
+                require(services().windows->mousePointer() == kPointerDefault, "a call that worked left the hourglass");
         } catch (const Error& e) {
             kg::fuzz::expectError(e, kKnownErrors, "cTavixGraph::invoke");
             // A failed request hands the pointer back; a call no operation took leaves it alone.
-            require(ui_->mousePointer() == (known ? kPointerDefault : pointerBefore),
-                    "a failed call left the mouse pointer at " + std::to_string(ui_->mousePointer()) +
+            require(services().windows->mousePointer() == (known ? kPointerDefault : pointerBefore),
+                    "a failed call left the mouse pointer at " + std::to_string(services().windows->mousePointer()) +
                         " (it was " + std::to_string(pointerBefore) + "): " + e.description());
         } catch (const std::exception& e) {
             kg::fuzz::fail(std::string("cTavixGraph::invoke raised a non-kg exception: ") + e.what());
@@ -135,7 +136,7 @@ public:
         return true;
     }
 
-    void setUi(HeadlessUi* ui) { ui_ = ui; }
+    void setPrompts(ui::ScriptedPrompter* prompts) { prompts_ = prompts; }
 
 private:
     int16_t choice()
@@ -172,7 +173,7 @@ private:
     ByteReader& in_;
     std::array<Ref<Object>, kFormCount> forms_;
     Ref<cTavixGraph> graph_ = makeRef<cTavixGraph>();
-    HeadlessUi* ui_ = nullptr;
+    ui::ScriptedPrompter* prompts_ = nullptr;
 };
 
 void resetSharedState()
@@ -190,30 +191,32 @@ extern "C" int LLVMFuzzerInitialize(int* argc, char*** argv)
     static QCoreApplication app(*argc, *argv);
     static QTemporaryDir scratch;  // the settings file and the jobs database; removed at exit
     const QString folder = scratch.path();
-    stand::Config& cfg = stand::config();
+    stand::Config cfg;
     cfg.settingsFile = (folder + "/settings.ini").toStdString();
     cfg.appFolder = folder.toStdString();
     cfg.jobsDatabase = (folder + "/jobs.db").toStdString();
     stand::SampleJobsSpec jobs;
     jobs.count = 40;
     stand::writeSampleJobs(cfg.jobsDatabase, jobs);
+    services().hostObjects = stand::makeFactory(cfg);
     return 0;
 }
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
     ByteReader in(data, size);
-    auto headless = std::make_unique<HeadlessUi>();
-    HeadlessUi* ui = headless.get();
-    setUiServices(std::move(headless));
+    Services fresh;
+    auto prompts = std::make_shared<ui::ScriptedPrompter>();
+    fresh.prompter = prompts;
+    fresh.hostObjects = services().hostObjects;
+    ScopedServices scoped(std::move(fresh));
     resetSharedState();
     {
         Session session(in);
-        session.setUi(ui);
+        session.setPrompts(prompts.get());
         for (int calls = 0; calls < 8 && session.step(); ++calls) {
         }
     }
     resetSharedState();
-    setUiServices(nullptr);
     return 0;
 }

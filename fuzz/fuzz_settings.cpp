@@ -109,8 +109,6 @@ extern "C" int LLVMFuzzerInitialize(int* argc, char*** argv)
 {
     qputenv("QT_QPA_PLATFORM", "offscreen");
     static QApplication app(*argc, *argv);  // the style dialog is a widget
-    stand::config().settingsFile = settingsPath();
-    stand::config().appFolder = QDir::tempPath().toStdString();
     return 0;
 }
 
@@ -129,7 +127,10 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
         expectOnly({kSettingsError}, "SettingsFile::read", [&] { file.read(std::string("Tavix/2dCharts/") + key); });
 
     // The component's objects, as GraphInitialize makes them.
-    Ref<host::HostObjectFactory> factory = stand::makeFactory();
+    stand::Config cfg;
+    cfg.settingsFile = settingsPath();
+    cfg.appFolder = QDir::tempPath().toStdString();
+    Ref<host::HostObjectFactory> factory = stand::makeFactory(cfg);
     modMain::goAppServices = Variant(factory->create(host::HostClass::AppServices));
     modMain::goSettings = Variant(factory->create(host::HostClass::Settings));
     modMain::goChart = makeRef<c2dChart>([] { return modMain::goAppServices; }, [] { return modMain::goSettings; });

@@ -2,14 +2,6 @@
 
 namespace kg::host {
 
-namespace {
-Ref<HostObjectFactory>& current()
-{
-    static Ref<HostObjectFactory> factory;
-    return factory;
-}
-}  // namespace
-
 const char* hostClassName(HostClass c)
 {
     switch (c) {
@@ -20,9 +12,5 @@ const char* hostClassName(HostClass c)
     }
     return "?";
 }
-
-Ref<HostObjectFactory> hostObjectFactory() { return current(); }
-
-void setHostObjectFactory(Ref<HostObjectFactory> factory) { current() = std::move(factory); }
 
 }  // namespace kg::host

@@ -1,6 +1,6 @@
 #pragma once
 // Contracts of the host's library objects, reached late-bound by name through the dispatch layer.
-// The component never includes the test stand: it asks the registered factory for new objects.
+// The component never includes the test stand: it asks the factory in its services for new objects.
 //
 // goAppServices members (every argument by reference; "out" arguments are written back):
 //   GetAppFolder(out folder)                  the application folder, no trailing separator
@@ -32,10 +32,5 @@ class HostObjectFactory : public RefCounted {
 public:
     virtual Ref<Object> create(HostClass cls) = 0;
 };
-
-// The factory in use, or null before a host installed one (the C surface installs the test
-// stand's when the host has none).
-Ref<HostObjectFactory> hostObjectFactory();
-void setHostObjectFactory(Ref<HostObjectFactory> factory);
 
 }  // namespace kg::host

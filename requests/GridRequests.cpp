@@ -1,7 +1,7 @@
 #include "builders/GridSeriesBuilders.h"
 #include "builders/LateBoundGrid.h"
 #include "requests/Requests.h"
-#include "requests/UiServices.h"
+#include "requests/Services.h"
 #include "requests/modMain.h"
 #include "core/Convert.h"
 
@@ -63,7 +63,7 @@ void generateGridChart(GridRequest request, int32_t numSeries, const Variant& to
     const int32_t rows = grid.Rows();
     const bool noRows = rows == grid.FixedRows();
     if (noTotal || noRows) {
-        uiServices().messageBox(kNoData);
+        services().prompter->showMessage(kNoData);
         return;
     }
     giChartKind = row.requestKind;

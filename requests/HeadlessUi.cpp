@@ -6,36 +6,16 @@ namespace kg {
 
 Ref<ChartWindowPort> HeadlessUi::loadChartWindow()
 {
-    if (!window_) {
-        window_ = makeRef<HeadlessChartWindow>();
-        ++windowLoads;
-    }
+    if (!window_) window_ = makeRef<HeadlessChartWindow>();
     return window_;
 }
 
-int16_t HeadlessUi::chooseData(ChoiceDialog dialog)
+int16_t NoScreenPrompter::chooseData(ChoiceDialog)
 {
-    dialogsShown.push_back(dialog);
-    if (choices.empty()) throw Error::invalidCall("no answer was scripted for the data choice dialog");
-    const int16_t choice = choices.front();
-    choices.pop_front();
-    return choice;
+    throw Error::invalidCall("no answer was scripted for the data choice dialog");
 }
 
-namespace {
-std::unique_ptr<UiServices>& installed()
-{
-    static std::unique_ptr<UiServices> services;
-    return services;
-}
-}  // namespace
-
-UiServices& uiServices()
-{
-    if (!installed()) installed() = std::make_unique<HeadlessUi>();
-    return *installed();
-}
-
-void setUiServices(std::unique_ptr<UiServices> services) { installed() = std::move(services); }
+std::shared_ptr<WindowService> headlessWindows() { return std::make_shared<HeadlessUi>(); }
+std::shared_ptr<Prompter> noScreenPrompter() { return std::make_shared<NoScreenPrompter>(); }
 
 }  // namespace kg

@@ -1,12 +1,9 @@
 #pragma once
-// The UI without a screen: a chart window that only holds its control, message boxes and dialog
-// answers that are recorded and scripted. The default until the windows install themselves, and the
-// one the model tests use.
-#include <deque>
+// The component without a screen, for hosts that have no Qt application: a chart window that only
+// holds its control, the mouse pointer as a value, and a prompter that cannot ask anyone.
 #include <string>
-#include <vector>
 
-#include "requests/UiServices.h"
+#include "requests/Services.h"
 
 namespace kg {
 
@@ -25,25 +22,22 @@ private:
     bool shown_ = false;
 };
 
-class HeadlessUi : public UiServices {
+class HeadlessUi : public WindowService {
 public:
     Ref<ChartWindowPort> loadChartWindow() override;
-    void messageBox(const std::string& text) override { messages.push_back(text); }
-    int16_t chooseData(ChoiceDialog dialog) override;
     void setMousePointer(int pointer) override { pointer_ = pointer; }
     int mousePointer() const override { return pointer_; }
-
-    // Closing the window: the next load creates a new one.
-    void unloadChartWindow() { window_.reset(); }
-
-    std::vector<std::string> messages;
-    std::deque<int16_t> choices;           // answers of the data choice dialogs, in order
-    std::vector<ChoiceDialog> dialogsShown;
-    int windowLoads = 0;
 
 private:
     Ref<ChartWindowPort> window_;
     int pointer_ = kPointerDefault;
+};
+
+// No one to ask: a message goes nowhere visible, a data choice fails.
+class NoScreenPrompter : public Prompter {
+public:
+    void showMessage(const std::string&) override {}
+    int16_t chooseData(ChoiceDialog dialog) override;
 };
 
 }  // namespace kg

@@ -1,7 +1,7 @@
 #include "builders/JobStatusBuilder.h"
 #include "builders/LateBoundGrid.h"
 #include "requests/Requests.h"
-#include "requests/UiServices.h"
+#include "requests/Services.h"
 #include "requests/modMain.h"
 #include "core/Convert.h"
 
@@ -15,7 +15,7 @@ void GenerateChart_JobStatusReport()
     const Variant from = builders::datePickerValue(gvSourceForm, "dtpFromDate");
     const Variant to = builders::datePickerValue(gvSourceForm, "dtpToDate");
     if (toDouble(to) < toDouble(from)) {
-        uiServices().messageBox(kDatesReversed);
+        services().prompter->showMessage(kDatesReversed);
         return;
     }
     HourglassOn();
@@ -25,7 +25,7 @@ void GenerateChart_JobStatusReport()
         Args b{builders::datePickerValue(gvSourceForm, "dtpToDate")};
         call(goJobData, "SetToDate", b);
     }
-    if (!builders::DrawJobStatus(buildContext(), goJobData, goAppServices)) uiServices().messageBox(kNoJobs);
+    if (!builders::DrawJobStatus(buildContext(), goJobData, goAppServices)) services().prompter->showMessage(kNoJobs);
 }
 
 }  // namespace kg::requests

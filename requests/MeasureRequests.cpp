@@ -2,7 +2,7 @@
 #include "builders/LateBoundGrid.h"
 #include "requests/Measures.h"
 #include "requests/Requests.h"
-#include "requests/UiServices.h"
+#include "requests/Services.h"
 #include "requests/modMain.h"
 
 namespace kg::requests {
@@ -17,7 +17,7 @@ void measureRequest(int16_t requestKind)
     builders::LateBoundGrid grid(call(gvSourceForm, "gridsettings1"));
     const int32_t rows = grid.Rows();
     if (rows == grid.FixedRows()) {
-        uiServices().messageBox(kNoData);
+        services().prompter->showMessage(kNoData);
         return;
     }
     // Stored before the dialog: a cancelled choice still leaves the code.
@@ -30,7 +30,7 @@ void measureRequest(int16_t requestKind)
 bool chooseAndDrawMeasure(int16_t requestKind)
 {
     const bool quoteTypes = requestKind == kBookingsRequest;
-    const int16_t choice = uiServices().chooseData(quoteTypes ? ChoiceDialog::QuoteType : ChoiceDialog::Category);
+    const int16_t choice = services().prompter->chooseData(quoteTypes ? ChoiceDialog::QuoteType : ChoiceDialog::Category);
     if (choice == kChoiceCancelled) return false;
     HourglassOn();
     // No row of the table matches: nothing is drawn.

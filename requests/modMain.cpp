@@ -1,17 +1,17 @@
 #include "requests/modMain.h"
 
-#include "requests/UiServices.h"
+#include "requests/Services.h"
 #include "core/Error.h"
 #include "host/HostObjects.h"
 
 namespace kg::modMain {
 
-void HourglassOn() { uiServices().setMousePointer(kPointerHourglass); }
-void HourglassOff() { uiServices().setMousePointer(kPointerDefault); }
+void HourglassOn() { services().windows->setMousePointer(kPointerHourglass); }
+void HourglassOff() { services().windows->setMousePointer(kPointerDefault); }
 
 void GraphInitialize()
 {
-    Ref<host::HostObjectFactory> factory = host::hostObjectFactory();
+    Ref<host::HostObjectFactory> factory = services().hostObjects;
     if (!factory) throw Error::objectNotSet("no host object factory is installed");
     goAppServices = factory->create(host::HostClass::AppServices);
     goJobData = factory->create(host::HostClass::JobData);
@@ -19,7 +19,7 @@ void GraphInitialize()
     // The chart reaches the host objects as they are when it calls, not as they were when created.
     goChart = makeRef<c2dChart>([] { return goAppServices; }, [] { return goSettings; });
     goSettings = factory->create(host::HostClass::Settings);
-    gfChart = uiServices().loadChartWindow();
+    gfChart = services().windows->loadChartWindow();
 }
 
 void releaseSharedObjects()

@@ -1,5 +1,6 @@
 // goAppServices: the application folder, the settings owner, job cells as text, the shell error
 // report, window placement and the window event log.
+#include <atomic>
 #include <cstdio>
 #include <mutex>
 #include <set>
@@ -17,28 +18,12 @@ namespace kg::teststand {
 
 namespace {
 
-struct ShellErrors {
-    std::mutex mutex;
-    ShellErrorReporter reporter;
-    int32_t last = 0;
-};
+std::atomic<int32_t> g_lastShellError{0};
 
-ShellErrors& shellErrors()
-{
-    static ShellErrors s;
-    return s;
-}
-
-void reportShellError(int32_t code)
+void reportShellError(const ShellErrorReporter& reporter, int32_t code)
 {
     const std::string text = shellErrorText(code);
-    ShellErrorReporter reporter;
-    {
-        ShellErrors& s = shellErrors();
-        std::lock_guard lock(s.mutex);
-        s.last = code;
-        reporter = s.reporter;
-    }
+    g_lastShellError = code;
     if (reporter)
         reporter(code, text);
     else
@@ -122,7 +107,7 @@ protected:
             break;
         case kReportShellError:
             expectArgs(args, 1, member);
-            reportShellError(longArg(args, 0, where(id)));
+            reportShellError(cfg_.shellErrorReporter, longArg(args, 0, where(id)));
             break;
         case kRestoreFormState:
             expectArgs(args, 2, member);
@@ -151,13 +136,6 @@ private:
 
 }  // namespace
 
-void setShellErrorReporter(ShellErrorReporter reporter)
-{
-    ShellErrors& s = shellErrors();
-    std::lock_guard lock(s.mutex);
-    s.reporter = std::move(reporter);
-}
-
 std::string shellErrorText(int32_t code)
 {
     const char* meaning = code == 2    ? "file not found"
@@ -166,12 +144,7 @@ std::string shellErrorText(int32_t code)
     return "Could not open the help file (shell error " + std::to_string(code) + ": " + meaning + ")";
 }
 
-int32_t lastShellError()
-{
-    ShellErrors& s = shellErrors();
-    std::lock_guard lock(s.mutex);
-    return s.last;
-}
+int32_t lastShellError() { return g_lastShellError; }
 
 Ref<Object> makeAppServices(const Config& cfg) { return makeRef<AppServicesObject>(cfg); }
 

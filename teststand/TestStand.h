@@ -21,6 +21,11 @@
 
 namespace kg::teststand {
 
+// ReportShellError cannot show a message box from here (no widgets in this layer): it hands the
+// code and its text to the reporter, which a window layer may set. Without one the text goes to
+// stderr.
+using ShellErrorReporter = std::function<void(int32_t code, const std::string& text)>;
+
 struct Config {
     std::string settingsFile;   // empty: the user's file, $XDG_CONFIG_HOME/karstgraph/settings.ini
     std::string settingsOwner = "Tavix";
@@ -28,12 +33,11 @@ struct Config {
     std::string eventLogFile;   // empty: no event log file
     bool eventLogToStderr = false;
     std::string jobsDatabase;   // the job data's database file
+    ShellErrorReporter shellErrorReporter;  // empty: stderr
 };
 
-// The configuration every new test stand object reads when it is created.
-Config& config();
-
-Ref<host::HostObjectFactory> makeFactory();
+// The test stand's objects, each made with `cfg` as it is now.
+Ref<host::HostObjectFactory> makeFactory(Config cfg = {});
 
 // The source form of a JSON form file; Error naming the file, member and row for a malformed one.
 Ref<Object> loadFormFile(const std::string& path);
@@ -60,11 +64,6 @@ constexpr int32_t JobData = 3;     // the jobs database cannot be queried
 constexpr int32_t Injected = 1000; // a failure planned by FaultPlan
 }  // namespace hosterr
 
-// ReportShellError cannot show a message box from here (no widgets in this layer): it hands the
-// code and its text to the reporter, which a window layer may replace. The default reporter prints
-// the text to stderr.
-using ShellErrorReporter = std::function<void(int32_t code, const std::string& text)>;
-void setShellErrorReporter(ShellErrorReporter reporter);  // an empty function restores the default
 // "Could not open the help file (shell error <code>: <meaning>)".
 std::string shellErrorText(int32_t code);
 // The code of the last ReportShellError in this process; 0 before the first.

@@ -1,4 +1,4 @@
-// The test stand's factory and configuration, and goHostAux, which only has to exist.
+// The test stand's factory, and goHostAux, which only has to exist.
 #include "teststand/FaultPlan.h"
 #include "teststand/StandObject.h"
 #include "teststand/StandObjects.h"
@@ -17,29 +17,26 @@ protected:
 
 class Factory final : public host::HostObjectFactory {
 public:
+    explicit Factory(Config cfg) : cfg_(std::move(cfg)) {}
     Ref<Object> create(host::HostClass cls) override
     {
         FaultPlan::check("Factory", host::hostClassName(cls));
-        const Config& cfg = config();
         switch (cls) {
-        case host::HostClass::AppServices: return makeAppServices(cfg);
-        case host::HostClass::JobData: return makeJobData(cfg);
+        case host::HostClass::AppServices: return makeAppServices(cfg_);
+        case host::HostClass::JobData: return makeJobData(cfg_);
         case host::HostClass::HostAux: return makeHostAux();
-        case host::HostClass::Settings: return makeSettings(cfg);
+        case host::HostClass::Settings: return makeSettings(cfg_);
         }
         throw Error::invalidCall("no host class has the code " + std::to_string(static_cast<int>(cls)));
     }
+
+private:
+    Config cfg_;
 };
 
 }  // namespace
 
-Config& config()
-{
-    static Config cfg;
-    return cfg;
-}
-
-Ref<host::HostObjectFactory> makeFactory() { return makeRef<Factory>(); }
+Ref<host::HostObjectFactory> makeFactory(Config cfg) { return makeRef<Factory>(std::move(cfg)); }
 
 Ref<Object> makeHostAux() { return makeRef<HostAuxObject>(); }
 

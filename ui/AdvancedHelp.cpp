@@ -4,6 +4,7 @@
 #include <QProcess>
 #include <QStandardPaths>
 
+#include "requests/Services.h"
 #include "requests/modMain.h"
 #include "core/Convert.h"
 
@@ -13,12 +14,6 @@ namespace {
 
 constexpr const char* kHelpFolder = "/Help/";
 constexpr const char* kHelpFile = "chartctl.hlp";
-
-HelpOpener& currentOpener()
-{
-    static HelpOpener opener = desktopOpener();
-    return opener;
-}
 
 }  // namespace
 
@@ -35,14 +30,13 @@ HelpOpener desktopOpener(std::string program)
     };
 }
 
-void setHelpOpener(HelpOpener opener) { currentOpener() = opener ? std::move(opener) : desktopOpener(); }
-
 void openAdvancedHelp()
 {
     Args folder{Variant(std::string())};
     call(modMain::goAppServices, "GetAppFolder", folder);
     const std::string path = toText(folder[0]) + kHelpFolder + kHelpFile;
-    const int code = currentOpener()(path);
+    const HelpOpener& opener = services().helpOpener;
+    const int code = opener ? opener(path) : desktopOpener()(path);
     if (code < 32) call(modMain::goAppServices, "ReportShellError", {Variant(int32_t(code))});
 }
 

@@ -4,7 +4,7 @@
 // shell-style code below 32; codes of 32 and above mean success.
 //
 //   kg::ui::openAdvancedHelp();                                   // the chart window's F1
-//   kg::ui::setHelpOpener([](const std::string& path) { ...; return kg::ui::kShellOk; });  // tests
+//   kg::services().helpOpener = [](const std::string& path) { ...; return kg::ui::kShellOk; };  // tests
 #include <functional>
 #include <string>
 
@@ -22,10 +22,8 @@ using HelpOpener = std::function<int(const std::string& path)>;
 // 2 when the file does not exist, 31 when the program is not on the PATH or does not start, else 42.
 HelpOpener desktopOpener(std::string program = "xdg-open");
 
-// Replaces the opener that openAdvancedHelp() uses; an empty function restores desktopOpener().
-void setHelpOpener(HelpOpener opener);
-
-// GetAppFolder, then opens <folder>/Help/chartctl.hlp; a code below 32 goes to ReportShellError.
+// GetAppFolder, then opens <folder>/Help/chartctl.hlp with the services' help opener (none:
+// desktopOpener()); a code below 32 goes to ReportShellError.
 // Errors of the host's objects leave as kg::Error.
 void openAdvancedHelp();
 

@@ -3,6 +3,11 @@
 #include <QDialog>
 #include <QFileDialog>
 #include <QMessageBox>
+#include <QPushButton>
+#include <QRadioButton>
+
+#include "requests/HeadlessUi.h"
+#include "ui/frmChoose.h"
 
 namespace kg::ui {
 
@@ -12,6 +17,13 @@ void QtPrompter::showMessage(const std::string& text)
     box.exec();
 }
 
+int16_t QtPrompter::chooseData(ChoiceDialog dialog)
+{
+    frmChoose form(dialog);
+    execModal(form);
+    return form.iChoice;
+}
+
 void QtPrompter::execModal(QDialog& dialog) { dialog.exec(); }
 
 std::string QtPrompter::askSaveFile(const std::string& caption, const std::string& filter)
@@ -19,6 +31,20 @@ std::string QtPrompter::askSaveFile(const std::string& caption, const std::strin
     return QFileDialog::getSaveFileName(nullptr, QString::fromStdString(caption), QString(),
                                         QString::fromStdString(filter))
         .toStdString();
+}
+
+int16_t ScriptedPrompter::chooseData(ChoiceDialog dialog)
+{
+    if (choices.empty()) {
+        if (answers.empty()) return NoScreenPrompter().chooseData(dialog);
+        frmChoose form(dialog);
+        execModal(form);
+        return form.iChoice;
+    }
+    dialogsShown.push_back(dialog == ChoiceDialog::QuoteType ? "frmChoose1" : "frmChoose2");
+    const int16_t choice = choices.front();
+    choices.pop_front();
+    return choice;
 }
 
 std::string ScriptedPrompter::askSaveFile(const std::string&, const std::string&)
@@ -45,15 +71,25 @@ void ScriptedPrompter::execModal(QDialog& dialog)
     if (dialog.isVisible()) dialog.close();
 }
 
-namespace {
-std::unique_ptr<Prompter>& current()
+ScriptedPrompter::Answer ScriptedPrompter::choose(int16_t choice)
 {
-    static std::unique_ptr<Prompter> p = std::make_unique<QtPrompter>();
-    return p;
+    return [choice](QDialog& dialog) {
+        auto* form = qobject_cast<frmChoose*>(&dialog);
+        if (!form) return;
+        if (choice == kChoiceCancelled) {
+            form->Command2->click();
+            return;
+        }
+        if (choice >= 0 && choice < 7) form->optData[choice]->click();
+        form->Command1->click();
+    };
 }
-}  // namespace
 
-Prompter& prompter() { return *current(); }
-void setPrompter(std::unique_ptr<Prompter> p) { current() = std::move(p); }
+WindowPrompter& prompter()
+{
+    if (auto* windows = dynamic_cast<WindowPrompter*>(services().prompter.get())) return *windows;
+    static QtPrompter qt;
+    return qt;
+}
 
 }  // namespace kg::ui

@@ -3,7 +3,6 @@
 #include <QApplication>
 
 #include "ui/Prompter.h"
-#include "ui/frmChoose.h"
 
 namespace kg::ui {
 
@@ -47,15 +46,6 @@ Ref<ChartWindowPort> QtUi::loadChartWindow()
     return port_;
 }
 
-void QtUi::messageBox(const std::string& text) { prompter().showMessage(text); }
-
-int16_t QtUi::chooseData(ChoiceDialog dialog)
-{
-    frmChoose form(dialog);
-    prompter().execModal(form);
-    return form.iChoice;
-}
-
 void QtUi::setMousePointer(int pointer)
 {
     // Not nested: one default pointer clears any number of hourglasses.
@@ -65,7 +55,11 @@ void QtUi::setMousePointer(int pointer)
     pointer_ = pointer;
 }
 
-void installQtUi() { setUiServices(std::make_unique<QtUi>()); }
+void installQtUi()
+{
+    services().windows = std::make_shared<QtUi>();
+    services().prompter = std::make_shared<QtPrompter>();
+}
 
 void installQtUiForApplication()
 {

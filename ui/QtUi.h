@@ -1,18 +1,16 @@
 #pragma once
-// The component's UI on screen: the chart window frmChart, message boxes and the data choice dialogs
-// through the prompter, and the mouse pointer as the application's override cursor.
+// The component's UI on screen: the chart window frmChart, and the mouse pointer as the
+// application's override cursor. Its prompts are the Qt dialogs (ui/Prompter.h).
 #include <QPointer>
 
-#include "requests/UiServices.h"
+#include "requests/Services.h"
 #include "ui/frmChart.h"
 
 namespace kg::ui {
 
-class QtUi : public UiServices {
+class QtUi : public WindowService {
 public:
     Ref<ChartWindowPort> loadChartWindow() override;
-    void messageBox(const std::string& text) override;
-    int16_t chooseData(ChoiceDialog dialog) override;
     void setMousePointer(int pointer) override;
     int mousePointer() const override { return pointer_; }
 
@@ -25,7 +23,7 @@ private:
     int pointer_ = kPointerDefault;
 };
 
-// Installs the Qt windows as the component's UI (needs a QApplication).
+// Installs the Qt windows and the Qt dialogs into the services in use (needs a QApplication).
 void installQtUi();
 // Installs them once when the process has a QApplication (a widget host); otherwise does nothing.
 void installQtUiForApplication();

@@ -31,7 +31,7 @@ frmChart::frmChart(Ref<control::ChartControl> chart) : chart_(std::move(chart))
     view_->setObjectName("Chart1");
     // The control fills the client area and follows its size, with no margin.
     setCentralWidget(view_);
-    control::installPrinting(*chart_);
+    control::installPrinting(*chart_, [] { return services().printToPdf; });
     buildMenu();
     resize(6756 / kTwipsPerPixel, 3732 / kTwipsPerPixel + menuBar()->sizeHint().height());
 }

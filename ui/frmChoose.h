@@ -5,7 +5,7 @@
 #include <QDialog>
 
 #include "requests/Measures.h"
-#include "requests/UiServices.h"
+#include "requests/Services.h"
 
 class QRadioButton;
 class QPushButton;

@@ -13,7 +13,7 @@
 #include "chart/ChartStyle.h"
 #include "core/Convert.h"
 #include "core/Error.h"
-#include "host/HostObjects.h"
+#include "requests/Services.h"
 #include "teststand/SampleData.h"
 #include "teststand/TestStand.h"
 
@@ -67,8 +67,8 @@ std::vector<Chart> galleryCharts(const kg::teststand::SampleTotals& totals)
 
 void storeStyle(const Style& style)
 {
-    kg::Variant settings(kg::host::hostObjectFactory()->create(kg::host::HostClass::Settings));
-    const kg::Variant owner(kg::teststand::config().settingsOwner);
+    kg::Variant settings(kg::services().hostObjects->create(kg::host::HostClass::Settings));
+    const kg::Variant owner(kg::teststand::Config().settingsOwner);
     using kg::chartstyle::Key;
     auto write = [&](Key key, const std::string& value) { kg::chartstyle::writeAs(settings, owner, key, value); };
     write(Key::View3D, kg::numberText(style.view3D ? 1.0 : 0.0));
@@ -139,9 +139,9 @@ int runGallery(int argc, char** argv)
 
     kg::teststand::SampleData sample;
     kg::Ref<kg::Object> form;
+    kg::teststand::Config stand;
     try {
         sample = kg::teststand::writeSampleData(folder + "/sample");
-        auto& stand = kg::teststand::config();
         stand.settingsFile = folder + "/sample/settings.ini";
         QFile::remove(QString::fromStdString(stand.settingsFile));
         stand.jobsDatabase = sample.database;
@@ -150,7 +150,7 @@ int runGallery(int argc, char** argv)
         std::fprintf(stderr, "karstgraph gallery: %s\n", e.description().c_str());
         return 1;
     }
-    kg::cli::installOffscreenComponent();
+    kg::cli::installOffscreenComponent(stand);
 
     const std::vector<Chart> charts = galleryCharts(sample.totals);
     std::vector<Entry> entries;

@@ -10,7 +10,7 @@
 #include "apps/cli/Commands.h"
 #include "apps/cli/RequestRunner.h"
 #include "chart/control/render/ChartExport.h"
-#include "requests/UiServices.h"
+#include "requests/Services.h"
 #include "core/Convert.h"
 #include "core/Error.h"
 #include "teststand/FaultPlan.h"
@@ -147,7 +147,7 @@ int runRender(int argc, char** argv)
     char* qtArgv[] = {name, nullptr};
     QApplication app(qtArgc, qtArgv);
 
-    auto& stand = kg::teststand::config();
+    kg::teststand::Config stand;
     if (!o.settings.empty()) stand.settingsFile = o.settings;
     kg::Ref<kg::Object> form;
     try {
@@ -158,7 +158,7 @@ int runRender(int argc, char** argv)
     }
     stand.jobsDatabase = !o.jobs.empty() ? o.jobs : kg::teststand::jobsDatabaseOf(form);
 
-    kg::cli::installOffscreenComponent();
+    kg::cli::installOffscreenComponent(stand);
     for (const PlannedFailure& f : o.failures) kg::teststand::FaultPlan::failOn(f.operation, f.call);
     const kg::cli::RequestResult result = kg::cli::runRequest(kg::Variant(form), o.call);
     struct Shutdown {

@@ -1,10 +1,7 @@
 #include "apps/cli/RequestRunner.h"
 
 #include <QApplication>
-#include <QDialog>
 #include <QWidget>
-#include <QPushButton>
-#include <QRadioButton>
 #include <cstring>
 
 #include "chart/control/render/ChartExport.h"
@@ -12,11 +9,9 @@
 #include "requests/modMain.h"
 #include "core/Convert.h"
 #include "core/Error.h"
-#include "host/HostObjects.h"
 #include "teststand/TestStand.h"
 #include "ui/Prompter.h"
 #include "ui/QtUi.h"
-#include "ui/frmChoose.h"
 
 namespace kg::cli {
 
@@ -24,32 +19,17 @@ namespace {
 
 ui::ScriptedPrompter* g_prompter = nullptr;
 
-// Answers the data choice dialog as a user would: click the option, then OK (or Cancel).
-ui::ScriptedPrompter::Answer choiceAnswer(int16_t choice)
-{
-    return [choice](QDialog& dialog) {
-        auto* form = qobject_cast<ui::frmChoose*>(&dialog);
-        if (!form) return;
-        if (choice == kChoiceCancelled) {
-            form->Command2->click();
-            return;
-        }
-        if (choice >= 0 && choice < 7) form->optData[choice]->click();
-        form->Command1->click();
-    };
-}
-
 const char* gridOf(const std::string& request) { return findOperation(request)->grid; }
 
 }  // namespace
 
-void installOffscreenComponent()
+void installOffscreenComponent(const teststand::Config& stand)
 {
     ui::installQtUi();
-    host::setHostObjectFactory(teststand::makeFactory());
-    auto prompter = std::make_unique<ui::ScriptedPrompter>();
+    services().hostObjects = teststand::makeFactory(stand);
+    auto prompter = std::make_shared<ui::ScriptedPrompter>();
     g_prompter = prompter.get();
-    ui::setPrompter(std::move(prompter));
+    services().prompter = std::move(prompter);
 }
 
 void shutdownComponent()
@@ -85,7 +65,8 @@ RequestResult runRequest(const Variant& form, const RequestCall& c)
 {
     g_prompter->messages.clear();
     g_prompter->answers.clear();
-    if (c.choice) g_prompter->answers.push_back(choiceAnswer(*c.choice));
+    // The data choice dialog is answered by clicking the real frmChoose's options.
+    if (c.choice) g_prompter->answers.push_back(ui::ScriptedPrompter::choose(*c.choice));
     try {
         auto graph = makeRef<cTavixGraph>();
         Args sourceForm{form};

@@ -7,6 +7,7 @@
 #include <string>
 
 #include "core/Variant.h"
+#include "teststand/TestStand.h"
 
 namespace kg::cli {
 
@@ -24,8 +25,9 @@ struct RequestResult {
     std::string text;  // the error ("error N: description") or the message box's text
 };
 
-// Once per process, before the first request: a QApplication must exist.
-void installOffscreenComponent();
+// Once per process, before the first request: a QApplication must exist. The host objects are
+// the test stand's, made with `stand`.
+void installOffscreenComponent(const teststand::Config& stand);
 // Before the application object goes: unloads the chart window and releases what the component holds.
 void shutdownComponent();
 

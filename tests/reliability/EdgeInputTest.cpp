@@ -117,13 +117,13 @@ struct EdgeFixture : test::RequestFixture {
         const int32_t number = request(id, std::move(args));
         EXPECT_EQ(number, e.error) << lastError;
         if (e.error == 0) {
-            EXPECT_TRUE(ui->messages.empty()) << ui->messages.back();
+            EXPECT_TRUE(prompts.messages.empty()) << prompts.messages.back();
             ASSERT_TRUE(modMain::gfChart && modMain::gfChart->isShown()) << "no chart shown";
         } else {
             EXPECT_NE(lastError.find(e.detail), std::string::npos) << lastError;
             EXPECT_LT(lastError.size(), 400u) << "a description must stay readable";
         }
-        EXPECT_EQ(ui->mousePointer(), kPointerDefault);
+        EXPECT_EQ(mousePointer(), kPointerDefault);
     }
     // The request on a form of one grid charts (and paints) or fails as expected, within `mb` MB.
     void expectOnGrid(const std::string& grid, DispId id, Args args, const Expected& e, long long mb = 512)
@@ -188,7 +188,7 @@ TEST_F(EdgeFixture, HundredThousandRowsOfQuoteTypesChartAsPoints)
 {
     setForm("{\"gridsettings1\": " + settingsGridJson(100000) +
             ", \"dtpFromDate\": \"2026-01-01\", \"dtpToDate\": \"2026-01-31\"}");
-    ui->choices = {0};
+    prompts.choices = {0};
     PeakMemory peak;
     expectOutcome(KG_DISPID_GENERATECHART_BOOKINGSREPORT, {}, kCharts);
     EXPECT_EQ(modMain::goChart->NumPoints(), 100000);
@@ -200,8 +200,8 @@ TEST_F(EdgeFixture, GridWithoutRowsIsNoData)
 {
     setForm(R"({"grid1": {"cells": []}})");
     ASSERT_EQ(request(KG_DISPID_GENERATECHART_HOURLYGRAPH1, {Variant(int32_t(2)), Variant(1.0)}), 0) << lastError;
-    EXPECT_EQ(ui->messages, std::vector<std::string>{"There is no data to work with"});
-    EXPECT_EQ(ui->mousePointer(), kPointerDefault);
+    EXPECT_EQ(prompts.messages, std::vector<std::string>{"There is no data to work with"});
+    EXPECT_EQ(mousePointer(), kPointerDefault);
 }
 
 // ---- Cells of 1 MB ---------------------------------------------------------------------------
@@ -356,12 +356,13 @@ TEST_P(DateLimits, JobStatusCountsTheJobsAtTheLimits)
     const DateCase& c = GetParam();
     const std::string database = dir.filePath("jobs.db").toStdString();
     writeJobsAtTheLimits(database);
-    stand::config().jobsDatabase = database;
+    standConfig.jobsDatabase = database;
+    standChanged();
     setForm(std::string("{\"dtpFromDate\": \"") + c.from + "\", \"dtpToDate\": \"" + c.to +
             "\", \"cboFields\": {\"1\": [\"a\", \"b\"]}}");
     ASSERT_EQ(request(KG_DISPID_GENERATECHART_JOBSTATUSREPORT), 0) << lastError;
-    EXPECT_EQ(ui->mousePointer(), kPointerDefault);
-    ASSERT_TRUE(ui->messages.empty()) << ui->messages.front();
+    EXPECT_EQ(mousePointer(), kPointerDefault);
+    ASSERT_TRUE(prompts.messages.empty()) << prompts.messages.front();
     EXPECT_EQ(chart1().chartArea.x.title, c.xTitle);
     EXPECT_EQ(chart1().data().y(1, 5), c.confirmedJobs) << "Confirmed";
 }
@@ -421,7 +422,7 @@ TEST_F(EdgeFixture, SeriesCountFarBeyondTheRowsWithValueLabelsStaysBounded)
     PeakMemory peak;
     const int32_t number = request(KG_DISPID_GENERATECHART_HOURLYGRAPH1, {Variant(int32_t(1 << 16)), Variant(10.0)});
     EXPECT_TRUE(number == 0 || number == errc::OutOfMemory) << number << ": " << lastError;
-    EXPECT_EQ(ui->mousePointer(), kPointerDefault);
+    EXPECT_EQ(mousePointer(), kPointerDefault);
     EXPECT_LT(peak.growthMb(), 100) << "MB for a grid of 2 rows (value labels: "
                                     << (modMain::gfChart ? chart1().chartLabels.size() : 0) << ")";
 }

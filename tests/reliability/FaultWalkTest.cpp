@@ -68,13 +68,14 @@ protected:
         jobs.lastDate = "2026-01-30";
         const std::string database = dir.filePath("jobs.db").toStdString();
         stand::writeSampleJobs(database, jobs);
-        stand::config().jobsDatabase = database;
+        standConfig.jobsDatabase = database;
+        standChanged();
         writeSetting("View3D", " 1");
         writeSetting("Rotation", " 20");
         writeSetting("Style", "Bar");
         writeSetting("LabelsOnDefault", "1");
         form_ = Variant(stand::loadFormJson(goodForm(), "walk form"));
-        settingsFile_ = QString::fromStdString(stand::config().settingsFile);
+        settingsFile_ = QString::fromStdString(standConfig.settingsFile);
     }
     void TearDown() override
     {
@@ -92,8 +93,8 @@ protected:
     }
     void scriptChoice()
     {
-        ui->choices.clear();
-        if (GetParam().choice != kNoChoice) ui->choices.push_back(GetParam().choice);
+        prompts.choices.clear();
+        if (GetParam().choice != kNoChoice) prompts.choices.push_back(GetParam().choice);
     }
     // Runs the request: its error number (0 on success), its description in lastError.
     int32_t runRequest()
@@ -107,9 +108,9 @@ protected:
     std::string charted()
     {
         if (const int32_t n = runRequest()) return "error " + std::to_string(n) + ": " + lastError;
-        if (!ui->messages.empty()) return "message box: " + ui->messages.back();
+        if (!prompts.messages.empty()) return "message box: " + prompts.messages.back();
         if (GetParam().id != KG_DISPID_GRAPHINITIALIZE && !(modMain::gfChart && modMain::gfChart->isShown())) return "no chart shown";
-        if (ui->mousePointer() != kPointerDefault) return "the pointer stays an hourglass";
+        if (mousePointer() != kPointerDefault) return "the pointer stays an hourglass";
         return {};
     }
 
@@ -127,7 +128,7 @@ TEST_P(FaultWalk, EveryFailurePointFailsTheRequestCleanly)
     for (const test::FailurePoint& p : points) {
         ++report.points;
         prepare();
-        ui->messages.clear();
+        prompts.messages.clear();
         const QByteArray settingsBefore = test::fileBytes(settingsFile_);
         const QStringList folderBefore = test::filesBeside(settingsFile_);
         FaultPlan::failOn(p.operation, p.call);
@@ -140,8 +141,8 @@ TEST_P(FaultWalk, EveryFailurePointFailsTheRequestCleanly)
             report.add(p, "returned error " + std::to_string(number) + " (" + lastError + "), not the injected one");
         else if (lastError.find(p.injectedText()) == std::string::npos)
             report.add(p, "the description \"" + lastError + "\" does not name the injected failure");
-        if (ui->mousePointer() != kPointerDefault) report.add(p, "the mouse pointer stays an hourglass");
-        if (!ui->messages.empty()) report.add(p, "a message box was shown: " + ui->messages.back());
+        if (mousePointer() != kPointerDefault) report.add(p, "the mouse pointer stays an hourglass");
+        if (!prompts.messages.empty()) report.add(p, "a message box was shown: " + prompts.messages.back());
         const std::string damage = test::settingsDamage(settingsFile_, settingsBefore, folderBefore);
         if (!damage.empty()) report.add(p, damage);
 

@@ -14,7 +14,6 @@
 #include <cstdio>
 #include <sys/resource.h>
 
-#include "chart/control/render/ChartPrinting.h"
 #include "teststand/SettingsFile.h"
 #include "reliability/FaultWalk.h"
 #include "support/RequestFixture.h"
@@ -22,7 +21,6 @@
 #include "ui/Prompter.h"
 #include "ui/QtUi.h"
 #include "ui/frmChartSetup.h"
-#include "ui/frmChoose.h"
 
 namespace kg {
 namespace {
@@ -76,13 +74,7 @@ public:
     void SetUp() override
     {
         RequestFixture::SetUp();
-        ui = nullptr;  // the headless UI is replaced by the windows
-        auto qt = std::make_unique<ui::QtUi>();
-        qt_ = qt.get();
-        setUiServices(std::move(qt));
-        auto scripted = std::make_unique<ui::ScriptedPrompter>();
-        prompts_ = scripted.get();
-        ui::setPrompter(std::move(scripted));
+        services->windows = qt_;
         writeSetting("View3D", " 1");
         writeSetting("Style", "Bar");
         const std::string grid = test::gridJson(1, 2, 14);
@@ -93,18 +85,16 @@ public:
                 "[\"Retail\", 12, 1200.0, 100.0, 40, 35.5], [\"Trade\", 3, 300.0, 100.0, 60, 64.5]]},"
                 " \"dtpFromDate\": \"2026-01-01\", \"dtpToDate\": \"2026-01-31\"}",
             "walk form"));
-        settingsFile_ = QString::fromStdString(stand::config().settingsFile);
+        settingsFile_ = QString::fromStdString(standConfig.settingsFile);
         // Printed beside, not in, the settings file's folder: that folder is checked for leftovers.
         QDir(dir.path()).mkpath("prints");
         pdf_ = dir.filePath("prints/print.pdf");
-        control::setPrintToPdfFile(pdf_.toStdString());
+        services->printToPdf = pdf_.toStdString();
     }
     void TearDown() override
     {
         FaultPlan::clear();
         closeWindow();
-        control::setPrintToPdfFile("");
-        ui::setPrompter(std::make_unique<ui::QtPrompter>());
         RequestFixture::TearDown();
     }
 
@@ -125,7 +115,7 @@ public:
     void bookingsShown()
     {
         noChart();
-        prompts_->answers.push_back(choose(0));
+        prompts.answers.push_back(ui::ScriptedPrompter::choose(0));
         ASSERT_EQ(request(KG_DISPID_GENERATECHART_BOOKINGSREPORT), 0) << lastError;
     }
 
@@ -139,8 +129,8 @@ public:
     }
     std::string styleDialogOk()
     {
-        prompts_->answers.clear();
-        prompts_->answers.push_back([](QDialog& d) {
+        prompts.answers.clear();
+        prompts.answers.push_back([](QDialog& d) {
             auto& setup = dynamic_cast<ui::frmChartSetup&>(d);
             setup.num3D[0]->setValue(Variant(30.0));
             setup.optChartType[3]->click();  // Pie
@@ -163,13 +153,13 @@ public:
         QFile::remove(pdf_);
         const std::string shown = menuCommand([this] { return window()->mnuPrint; });
         if (!shown.empty()) return shown;
-        if (control::printToPdfFile() == pdf_.toStdString() && QFileInfo(pdf_).size() == 0) return "nothing printed";
+        if (services->printToPdf == pdf_.toStdString() && QFileInfo(pdf_).size() == 0) return "nothing printed";
         return {};
     }
     std::string redraw()
     {
-        prompts_->answers.clear();
-        prompts_->answers.push_back(choose(5));
+        prompts.answers.clear();
+        prompts.answers.push_back(ui::ScriptedPrompter::choose(5));
         const std::string shown = menuCommand([this] { return window()->mnuRedraw; });
         if (!shown.empty()) return shown;
         if (modMain::chart().ChartHeader() != "Quote Type by $Value and Average $Value") return "no redraw";
@@ -177,13 +167,13 @@ public:
     }
     std::string close()
     {
-        prompts_->messages.clear();
+        prompts.messages.clear();
         if (!window()) return "no window to close";
         window()->close();
         QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
         if (window()) return "the window is still there";
         if (modMain::goChart) return "closing did not release the shared objects";
-        return prompts_->messages.empty() ? std::string() : prompts_->messages.back();
+        return prompts.messages.empty() ? std::string() : prompts.messages.back();
     }
 
     // ---- support ------------------------------------------------------------------------------
@@ -194,29 +184,20 @@ public:
         FaultPlan::clear();
         if (ui::frmChart* w = window()) w->close();
         QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
-        prompts_->messages.clear();
-    }
-    static ui::ScriptedPrompter::Answer choose(int option)
-    {
-        return [option](QDialog& d) {
-            auto& form = dynamic_cast<ui::frmChoose&>(d);
-            form.optData[option]->click();
-            form.Command1->click();
-        };
+        prompts.messages.clear();
     }
     // A menu command as the user gives it; a failure comes back as the message box it shows.
     std::string menuCommand(const std::function<QAction*()>& action)
     {
-        prompts_->messages.clear();
+        prompts.messages.clear();
         if (!window()) return "no window";
         action()->trigger();
-        return prompts_->messages.empty() ? std::string() : prompts_->messages.back();
+        return prompts.messages.empty() ? std::string() : prompts.messages.back();
     }
     std::string runCommand() { return (this->*GetParam().run)(); }
     void prepareCommand() { (this->*GetParam().prepare)(); }
 
-    ui::QtUi* qt_ = nullptr;
-    ui::ScriptedPrompter* prompts_ = nullptr;
+    std::shared_ptr<ui::QtUi> qt_ = std::make_shared<ui::QtUi>();
     Variant form_;
     QString settingsFile_;
     QString pdf_;
@@ -250,9 +231,9 @@ TEST_P(WindowWalk, EveryFailurePointIsReportedAndLeavesAWorkingComponent)
         std::string expected = p.injectedText();
         if (p.operation == kPrinterFails.operation) {
             const std::string missing = dir.filePath("missing/folder/print.pdf").toStdString();
-            control::setPrintToPdfFile(missing);
+            services->printToPdf = missing;
             failure = runCommand();
-            control::setPrintToPdfFile(pdf_.toStdString());
+            services->printToPdf = pdf_.toStdString();
             expected = "Printer error: cannot print to the PDF file " + missing;
         } else if (p.operation == kDiskFull.operation) {
             {

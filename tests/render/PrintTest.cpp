@@ -16,10 +16,10 @@ protected:
     {
         samples::styleLikeTheChartObject(chart, "Printed");
         samples::fillTable(chart, 3, 5, kBar);
-        installPrinting(chart);
+        installPrinting(chart, [this] { return pdfFile; });
     }
-    void TearDown() override { setPrintToPdfFile({}); }
     ChartControl chart;
+    std::string pdfFile;  // empty: the default printer
 };
 
 struct PrintCase {
@@ -35,7 +35,7 @@ TEST_P(PrintToPdfTest, PrintsOneLandscapePage)
 {
     QTemporaryDir dir = samples::scratchDir();
     const QString path = dir.filePath(QStringLiteral("printed.pdf"));
-    setPrintToPdfFile(path.toStdString());
+    pdfFile = path.toStdString();
     chart.shownWidth = GetParam().shownWidth;
     chart.shownHeight = GetParam().shownHeight;
     chart.print(GetParam().request);
@@ -68,7 +68,7 @@ TEST_P(PrintFailureTest, IsAPrinterError)
 {
     if (!*GetParam().pdfFile && !QPrinterInfo::defaultPrinter().isNull())
         GTEST_SKIP() << "this machine has a default printer";
-    setPrintToPdfFile(GetParam().pdfFile);
+    pdfFile = GetParam().pdfFile;
     samples::expectError([&] { chart.print({3, 4, 0, 0, 0, 0}); }, errc::PrinterError, GetParam().named);
 }
 

@@ -39,7 +39,7 @@ TEST_P(Headers, TotalIsWrittenByTheRequestsRule)
     EXPECT_EQ(modMain::giChartKind, c.chartKind);
     EXPECT_EQ(chart1().chartArea.y.title, c.yTitle);
     EXPECT_EQ(chart1().chartArea.x.title, "Month");
-    EXPECT_EQ(ui->mousePointer(), kPointerDefault);
+    EXPECT_EQ(mousePointer(), kPointerDefault);
     EXPECT_TRUE(modMain::gfChart->isShown());
     EXPECT_FALSE(modMain::gfChart->isRedrawVisible());
 }
@@ -138,7 +138,7 @@ TEST_P(Outcomes, EndAsTheArgumentsAndFormDecide)
     if (c.loadedFirst) {
         EXPECT_TRUE(modMain::goChart && modMain::gfChart);
     }
-    EXPECT_EQ(ui->mousePointer(), kPointerDefault);
+    EXPECT_EQ(mousePointer(), kPointerDefault);
 }
 
 const std::string kThreeRows = formWithAllGrids(1, 3, 14);
@@ -177,10 +177,10 @@ TEST_F(Fixture, NoDataShowsTheMessageAndChangesNothing)
     EXPECT_EQ(request(KG_DISPID_GENERATECHART_HOURLYGRAPH1, seriesAndTotal(2)), 0);  // caption rows only
     EXPECT_EQ(request(KG_DISPID_GENERATECHART_HOURLYGRAPH2, seriesAndTotal(2, Variant())),
               0);  // Empty total with a full grid
-    EXPECT_EQ(ui->messages, (std::vector<std::string>{"There is no data to work with",
+    EXPECT_EQ(prompts.messages, (std::vector<std::string>{"There is no data to work with",
                                                       "There is no data to work with"}));
     EXPECT_EQ(modMain::giChartKind, 4);
-    EXPECT_EQ(ui->mousePointer(), kPointerDefault);
+    EXPECT_EQ(mousePointer(), kPointerDefault);
     EXPECT_FALSE(modMain::gfChart->isShown());  // loaded by GraphInitialize, not shown
 }
 
@@ -203,7 +203,6 @@ TEST_F(Fixture, TwoRequestsInARowReplaceEverything)
     EXPECT_EQ(modMain::gfChart, window);        // the same window
     EXPECT_EQ(chart1().group1.seriesLabels, std::vector<std::string>{"Row 1"});
     EXPECT_EQ(modMain::gvArray.upper(0), 1);
-    EXPECT_EQ(ui->windowLoads, 1);
 }
 
 }  // namespace

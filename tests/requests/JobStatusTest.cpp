@@ -39,7 +39,8 @@ struct JobStatusFixture : test::RequestFixture {
         }
         EXPECT_EQ(sqlite3_exec(db, sql.c_str(), nullptr, nullptr, nullptr), SQLITE_OK);
         sqlite3_close(db);
-        teststand::config().jobsDatabase = database;
+        standConfig.jobsDatabase = database;
+        standChanged();
     }
 
     void setJobForm(const char* from, const char* to, int captions)
@@ -71,7 +72,7 @@ TEST_F(JobStatusFixture, CountsEveryCategoryOnItsOwn)
     EXPECT_EQ(modMain::giChartKind, 2);  // untouched
     EXPECT_FALSE(modMain::gfChart->isRedrawVisible());
     EXPECT_TRUE(modMain::gfChart->isShown());
-    EXPECT_EQ(uiServices().mousePointer(), kPointerDefault);
+    EXPECT_EQ(mousePointer(), kPointerDefault);
     EXPECT_EQ(chart1().header.text, "Tavix Job Status Chart");
     EXPECT_EQ(chart1().chartArea.x.title, "01/02/2026 - 28/02/2026");
     EXPECT_EQ(chart1().chartArea.y.title, "Quantity");
@@ -85,12 +86,13 @@ TEST_F(JobStatusFixture, CountsEveryCategoryOnItsOwn)
 
 TEST_F(JobStatusFixture, ReversedDatesAskTheHostNothing)
 {
-    teststand::config().jobsDatabase = dir.filePath("does-not-exist.db").toStdString();
+    standConfig.jobsDatabase = dir.filePath("does-not-exist.db").toStdString();
+    standChanged();
     setJobForm("2026-05-06", "2026-05-05", 13);
     EXPECT_EQ(request(KG_DISPID_GENERATECHART_JOBSTATUSREPORT),
               0) << lastError;  // a query would have failed on the missing file
-    EXPECT_EQ(ui->messages, std::vector<std::string>{"The FromDate must be less than or equal to the ToDate"});
-    EXPECT_EQ(uiServices().mousePointer(), kPointerDefault);
+    EXPECT_EQ(prompts.messages, std::vector<std::string>{"The FromDate must be less than or equal to the ToDate"});
+    EXPECT_EQ(mousePointer(), kPointerDefault);
 }
 
 TEST_F(JobStatusFixture, NoJobsShowsTheMessageAndNoWindow)
@@ -98,9 +100,9 @@ TEST_F(JobStatusFixture, NoJobsShowsTheMessageAndNoWindow)
     makeDatabase({{"2026-01-01", "Confirmed"}});
     setJobForm("2026-06-01", "2026-06-30", 13);
     EXPECT_EQ(request(KG_DISPID_GENERATECHART_JOBSTATUSREPORT), 0) << lastError;
-    EXPECT_EQ(ui->messages, std::vector<std::string>{"No jobs were found in that date range"});
+    EXPECT_EQ(prompts.messages, std::vector<std::string>{"No jobs were found in that date range"});
     EXPECT_FALSE(modMain::gfChart->isShown());
-    EXPECT_EQ(uiServices().mousePointer(), kPointerDefault);
+    EXPECT_EQ(mousePointer(), kPointerDefault);
     EXPECT_EQ(chart1().group1.pointLabels.size(), 13u);  // already set before the query
 }
 

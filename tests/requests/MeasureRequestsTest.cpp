@@ -42,7 +42,7 @@ TEST_P(Choices, DrawTheChosenMeasure)
 {
     const ChoiceCase& c = GetParam();
     setForm(kSettingsGrid);
-    ui->choices.push_back(c.choice);
+    prompts.choices.push_back(c.choice);
     ASSERT_EQ(request(c.request), 0) << lastError;
     control::ChartControl& chart = chart1();
     EXPECT_EQ(chart.header.text, c.header);
@@ -63,7 +63,7 @@ TEST_P(Choices, DrawTheChosenMeasure)
             EXPECT_EQ(toDouble(cell), c.series[s][p].value) << "series " << s + 1 << " point " << p + 1;
             EXPECT_EQ(chart.data().y(int32_t(s + 1), int32_t(p + 1)), c.series[s][p].value);
         }
-    EXPECT_EQ(uiServices().mousePointer(), kPointerDefault);
+    EXPECT_EQ(mousePointer(), kPointerDefault);
 }
 
 std::vector<ChoiceCase> choiceCases()
@@ -113,12 +113,12 @@ TEST_F(MeasureFixture, CancelledChoiceDrawsNothingButKeepsTheCode)
 {
     setForm(kSettingsGrid);
     modMain::giChartKind = 5;
-    ui->choices.push_back(kChoiceCancelled);
+    prompts.choices.push_back(kChoiceCancelled);
     ASSERT_EQ(request(KG_DISPID_GENERATECHART_SALESDECLARATION), 0) << lastError;
     EXPECT_EQ(modMain::giChartKind, 2);
     EXPECT_FALSE(modMain::gfChart->isShown());
-    EXPECT_EQ(uiServices().mousePointer(), kPointerDefault);
-    EXPECT_EQ(ui->dialogsShown, std::vector<ChoiceDialog>{ChoiceDialog::Category});
+    EXPECT_EQ(mousePointer(), kPointerDefault);
+    EXPECT_EQ(prompts.dialogsShown, std::vector<std::string>{"frmChoose2"});
 }
 
 TEST_F(MeasureFixture, GridWithoutDataRowsShowsTheMessageBeforeAnyDialog)
@@ -127,8 +127,8 @@ TEST_F(MeasureFixture, GridWithoutDataRowsShowsTheMessageBeforeAnyDialog)
             "\"P2\"]]}}");
     modMain::giChartKind = 4;
     ASSERT_EQ(request(KG_DISPID_GENERATECHART_BOOKINGSREPORT), 0) << lastError;
-    EXPECT_EQ(ui->messages, std::vector<std::string>{"There is no data to work with"});
-    EXPECT_TRUE(ui->dialogsShown.empty());
+    EXPECT_EQ(prompts.messages, std::vector<std::string>{"There is no data to work with"});
+    EXPECT_TRUE(prompts.dialogsShown.empty());
     EXPECT_EQ(modMain::giChartKind, 4);
 }
 
@@ -137,7 +137,7 @@ TEST_F(MeasureFixture, TwoFixedRowsStartAtTheSecondRow)
     setForm("{\"gridsettings1\": {\"fixedRows\": 2, \"cells\": [[\"T\", \"Qty\", \"V\", \"A\", \"P\", \"Q\"],"
             "[\"never read\", 99, 99, 99, 99, 99], [\"Retail\", 3, 1, 1, 1, 1], [\"Online\", 7, 1, 1, 1, 1]]},"
             " \"dtpFromDate\": \"2026-01-01\", \"dtpToDate\": \"2026-01-31\"}");
-    ui->choices.push_back(0);
+    prompts.choices.push_back(0);
     ASSERT_EQ(request(KG_DISPID_GENERATECHART_BOOKINGSREPORT), 0) << lastError;
     EXPECT_EQ(chart1().group1.pointLabels, (std::vector<std::string>{"Retail", "Online"}));
     EXPECT_EQ(chart1().data().y(1, 1), 3);

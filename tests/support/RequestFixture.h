@@ -1,36 +1,49 @@
 #pragma once
 // End-to-end request tests: a cTavixGraph driven through its dispatch ids, the test stand's host
-// objects on a temporary settings file, a form from JSON text, and the headless UI that records
-// message boxes and answers the data choice dialogs.
+// objects on a temporary settings file, a form from JSON text, the headless chart window, and the
+// scripted prompter that records message boxes and answers the data choice dialogs.
 #include <gtest/gtest.h>
 
 #include <QDir>
 #include <QTemporaryDir>
 #include <string>
 
-#include "requests/HeadlessUi.h"
+#include "requests/Services.h"
 #include "requests/cTavixGraph.h"
 #include "requests/modMain.h"
 #include "core/Error.h"
 #include "teststand/TestStand.h"
+#include "ui/Prompter.h"
 
 namespace kg::test {
 
+// The test stand on files in `dir`: its settings file and its application folder.
+inline teststand::Config standIn(const QTemporaryDir& dir)
+{
+    teststand::Config cfg;
+    cfg.settingsFile = dir.filePath("settings.ini").toStdString();
+    cfg.appFolder = dir.path().toStdString();
+    return cfg;
+}
+
+// Headless windows, a scripted prompter and the test stand made with `stand`.
+inline Services scriptedServices(const teststand::Config& stand)
+{
+    Services s;
+    s.prompter = std::make_shared<ui::ScriptedPrompter>();
+    s.hostObjects = teststand::makeFactory(stand);
+    return s;
+}
+
 struct RequestFixture : ::testing::Test {
     QTemporaryDir dir;
+    teststand::Config standConfig = standIn(dir);
+    ScopedServices services{scriptedServices(standConfig)};
+    ui::ScriptedPrompter& prompts = static_cast<ui::ScriptedPrompter&>(*services->prompter);
     Ref<cTavixGraph> graph = makeRef<cTavixGraph>();
-    HeadlessUi* ui = nullptr;
 
     void SetUp() override
     {
-        auto headless = std::make_unique<HeadlessUi>();
-        ui = headless.get();
-        setUiServices(std::move(headless));
-        host::setHostObjectFactory(teststand::makeFactory());
-        auto& cfg = teststand::config();
-        cfg = {};
-        cfg.settingsFile = dir.filePath("settings.ini").toStdString();
-        cfg.appFolder = dir.path().toStdString();
         modMain::releaseSharedObjects();
         modMain::gvSourceForm = Variant();
         modMain::giChartKind = 0;
@@ -39,14 +52,16 @@ struct RequestFixture : ::testing::Test {
     {
         modMain::releaseSharedObjects();
         modMain::gvSourceForm = Variant();
-        setUiServices(nullptr);
-        host::setHostObjectFactory(nullptr);
     }
+
+    // Host objects created from now on read `standConfig` as it is now.
+    void standChanged() { services->hostObjects = teststand::makeFactory(standConfig); }
+    int mousePointer() const { return kg::services().windows->mousePointer(); }
 
     void writeSetting(const std::string& key, const std::string& value)
     {
         Args a{Variant("2dCharts"), Variant(key), Variant(value), Variant("Tavix"), Variant(std::string())};
-        Ref<Object> settings = host::hostObjectFactory()->create(host::HostClass::Settings);
+        Ref<Object> settings = services->hostObjects->create(host::HostClass::Settings);
         call(Variant(settings), "WriteSetting", a);
     }
     void setForm(const std::string& json)

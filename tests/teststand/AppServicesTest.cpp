@@ -56,16 +56,11 @@ protected:
     void SetUp() override
     {
         ASSERT_TRUE(dir_.isValid());
-        config() = Config{};
-        config().settingsFile = dir_.filePath("settings.ini").toStdString();
+        cfg_.settingsFile = dir_.filePath("settings.ini").toStdString();
         recreate();
     }
-    void TearDown() override
-    {
-        config() = Config{};
-        setShellErrorReporter(nullptr);
-    }
-    void recreate() { app_ = Variant(makeFactory()->create(host::HostClass::AppServices)); }
+    // A new object made with cfg_ as it is now.
+    void recreate() { app_ = Variant(makeFactory(cfg_)->create(host::HostClass::AppServices)); }
 
     std::string out(const char* member, Args args = {Variant()})
     {
@@ -82,6 +77,7 @@ protected:
     }
 
     QTemporaryDir dir_{test::tempTemplate("app")};
+    Config cfg_;
     Variant app_;
 };
 
@@ -92,7 +88,7 @@ TEST_F(AppServices, FolderIsConfiguredElseFromTheEnvironmentElseTheOneHoldingHel
     EXPECT_EQ(QDir(QString::fromStdString(out("GetAppFolder"))).canonicalPath(), QDir(KG_BUILD_DIR).canonicalPath());
     env.set("/srv/karstgraph");
     EXPECT_EQ(out("GetAppFolder"), "/srv/karstgraph");
-    config().appFolder = "/opt/tavix/";
+    cfg_.appFolder = "/opt/tavix/";
     recreate();
     EXPECT_EQ(out("GetAppFolder"), "/opt/tavix") << "without its trailing separator";
 }
@@ -100,7 +96,7 @@ TEST_F(AppServices, FolderIsConfiguredElseFromTheEnvironmentElseTheOneHoldingHel
 TEST_F(AppServices, SettingsOwnerIsTavixUnlessConfigured)
 {
     EXPECT_EQ(out("GetSettingsOwner"), "Tavix");
-    config().settingsOwner = "Tavix Test";
+    cfg_.settingsOwner = "Tavix Test";
     EXPECT_EQ(out("GetSettingsOwner"), "Tavix") << "read when the object is created";
     recreate();
     EXPECT_EQ(out("GetSettingsOwner"), "Tavix Test");
@@ -158,7 +154,7 @@ TEST_P(InsanePlacement, LeavesTheWindowAlone)
     std::string value;
     for (const std::string& key : kPlacementOrder)
         if (values >> value && value != "-") ini += QByteArray::fromStdString("Chart\\" + key + "=" + value + "\n");
-    test::writeBytes(config().settingsFile, ini);
+    test::writeBytes(cfg_.settingsFile, ini);
     EXPECT_TRUE(restored("Chart")->puts.empty());
 }
 
@@ -183,15 +179,15 @@ TEST_F(AppServices, PlacementOfSomethingThatIsNoWindowFails)
 
 TEST_F(AppServices, EventsAreAppendedToTheLogAsLinesAndToStderrWhenAsked)
 {
-    config().eventLogFile = dir_.filePath("events.log").toStdString();
-    config().eventLogToStderr = true;
+    cfg_.eventLogFile = dir_.filePath("events.log").toStdString();
+    cfg_.eventLogToStderr = true;
     recreate();
     testing::internal::CaptureStderr();
     call(app_, "LogFormEvent", {"FormLoad", "frmChart"});
     call(app_, "LogFormEvent", {"FormQueryUnload", "frmChartSetup"});
     const std::string err = testing::internal::GetCapturedStderr();
     EXPECT_NE(err.find(" FormQueryUnload frmChartSetup\n"), std::string::npos) << err;
-    const QList<QByteArray> lines = test::fileBytes(config().eventLogFile).split('\n');
+    const QList<QByteArray> lines = test::fileBytes(cfg_.eventLogFile).split('\n');
     ASSERT_EQ(lines.size(), 3);
     EXPECT_TRUE(lines[2].isEmpty());
     const std::regex stamp(R"(\d{4}-\d\d-\d\dT\d\d:\d\d:\d\d\S* )");
@@ -203,15 +199,15 @@ TEST_F(AppServices, LogThatCannotBeWrittenDoesNotFailTheEvent)
 {
     const std::string blocker = dir_.filePath("file.txt").toStdString();
     test::writeBytes(blocker, "");
-    config().eventLogFile = blocker + "/events.log";
+    cfg_.eventLogFile = blocker + "/events.log";
     recreate();
     testing::internal::CaptureStderr();
     call(app_, "LogFormEvent", {"FormLoad", "frmChart"});
     call(app_, "LogFormEvent", {"FormQueryUnload", "frmChart"});
     const std::string err = testing::internal::GetCapturedStderr();
-    const size_t first = err.find(config().eventLogFile);
+    const size_t first = err.find(cfg_.eventLogFile);
     EXPECT_NE(first, std::string::npos) << err;
-    EXPECT_EQ(err.find(config().eventLogFile, first + 1), std::string::npos) << "warned once: " << err;
+    EXPECT_EQ(err.find(cfg_.eventLogFile, first + 1), std::string::npos) << "warned once: " << err;
 }
 
 struct ShellErrorCase : test::Named {
@@ -224,14 +220,16 @@ class ShellError : public AppServices, public testing::WithParamInterface<ShellE
 TEST_P(ShellError, IsReportedWithItsMeaning)
 {
     std::vector<std::pair<int32_t, std::string>> reports;
-    setShellErrorReporter([&](int32_t code, const std::string& text) { reports.emplace_back(code, text); });
+    cfg_.shellErrorReporter = [&](int32_t code, const std::string& text) { reports.emplace_back(code, text); };
+    recreate();
     call(app_, "ReportShellError", {GetParam().code});
     ASSERT_EQ(reports.size(), 1u);
     EXPECT_EQ(reports[0].first, GetParam().code);
     EXPECT_EQ(reports[0].second, GetParam().text);
     EXPECT_EQ(lastShellError(), GetParam().code);
     // Without a reporter of its own, the text goes to stderr.
-    setShellErrorReporter(nullptr);
+    cfg_.shellErrorReporter = nullptr;
+    recreate();
     testing::internal::CaptureStderr();
     call(app_, "ReportShellError", {GetParam().code});
     EXPECT_EQ(testing::internal::GetCapturedStderr(), GetParam().text + std::string("\n"));

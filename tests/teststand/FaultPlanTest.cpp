@@ -19,7 +19,15 @@ const std::string kSample = std::string(KG_TEST_DATA) + "/host/form_sample.json"
 
 Variant sampleForm() { return Variant(loadFormFile(kSample)); }
 Variant sampleMember(const char* member, Args args = {}) { return call(sampleForm(), member, args); }
-Variant hostObject(host::HostClass cls) { return Variant(makeFactory()->create(cls)); }
+// The settings file of the case being run; each case has a folder of its own.
+std::string g_settingsFile;
+
+Variant hostObject(host::HostClass cls)
+{
+    Config cfg;
+    cfg.settingsFile = g_settingsFile;
+    return Variant(makeFactory(cfg)->create(cls));
+}
 
 struct FaultCase : test::Named {
     std::string operation;
@@ -34,7 +42,7 @@ protected:
     void TearDown() override
     {
         FaultPlan::clear();
-        config() = Config{};
+        g_settingsFile.clear();
     }
 };
 
@@ -43,7 +51,7 @@ TEST_P(FaultPlanCase, FailsExactlyTheNthCall)
     const FaultCase& c = GetParam();
     QTemporaryDir dir(test::tempTemplate("fault"));
     ASSERT_TRUE(dir.isValid());
-    config().settingsFile = dir.filePath("settings.ini").toStdString();
+    g_settingsFile = dir.filePath("settings.ini").toStdString();
     const Variant target = c.member ? c.target() : Variant();
     const auto once = [&] {
         Args args = c.args;

@@ -55,13 +55,11 @@ protected:
         exec(path_, std::string(kSchema) + kJobs);
         useDatabase(path_);
     }
-    void TearDown() override { config() = Config{}; }
-
     void useDatabase(const std::string& path)
     {
-        config() = Config{};
-        config().jobsDatabase = path;
-        jobs_ = Variant(makeFactory()->create(host::HostClass::JobData));
+        Config cfg;
+        cfg.jobsDatabase = path;
+        jobs_ = Variant(makeFactory(cfg)->create(host::HostClass::JobData));
     }
 
     std::string query()

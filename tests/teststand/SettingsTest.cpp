@@ -37,11 +37,14 @@ protected:
     {
         ASSERT_TRUE(dir_.isValid());
         path_ = dir_.filePath("settings.ini").toStdString();
-        config() = Config{};
-        config().settingsFile = path_;
-        settings_ = Variant(makeFactory()->create(host::HostClass::Settings));
+        useFile(path_);
     }
-    void TearDown() override { config() = Config{}; }
+    void useFile(const std::string& path)
+    {
+        Config cfg;
+        cfg.settingsFile = path;
+        settings_ = Variant(makeFactory(cfg)->create(host::HostClass::Settings));
+    }
 
     std::string read(const std::string& section, const std::string& key, const std::string& def = "<default>",
                      const std::string& owner = "Tavix")
@@ -159,20 +162,19 @@ TEST_F(SettingsStore, FolderAtTheFilesPlaceOrAFileAtTheFoldersPlaceFails)
     expectFileError(test::errorOf([&] { write("2dCharts", "Style", "Pie"); }), path_);
     const std::string file = dir_.filePath("file.ini").toStdString();
     writeBytes(file, "[Tavix]\n");
-    config().settingsFile = file + "/settings.ini";
-    settings_ = Variant(makeFactory()->create(host::HostClass::Settings));
-    expectFileError(test::errorOf([&] { write("2dCharts", "Style", "Pie"); }), config().settingsFile);
+    useFile(file + "/settings.ini");
+    expectFileError(test::errorOf([&] { write("2dCharts", "Style", "Pie"); }), file + "/settings.ini");
     EXPECT_EQ(fileBytes(file), "[Tavix]\n");
 }
 
 TEST_F(SettingsStore, MissingFileReadsDefaultsAndIsCreatedByAWrite)
 {
-    config().settingsFile = dir_.filePath("new/folder/settings.ini").toStdString();
-    settings_ = Variant(makeFactory()->create(host::HostClass::Settings));
+    const std::string missing = dir_.filePath("new/folder/settings.ini").toStdString();
+    useFile(missing);
     EXPECT_EQ(read("2dCharts", "Style", "Bar"), "Bar");
     write("2dCharts", "Style", "Area");
     EXPECT_EQ(read("2dCharts", "Style", "Bar"), "Area");
-    EXPECT_TRUE(QFile::exists(QString::fromStdString(config().settingsFile)));
+    EXPECT_TRUE(QFile::exists(QString::fromStdString(missing)));
 }
 
 struct BadArgsCase : test::Named {

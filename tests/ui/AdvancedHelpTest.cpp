@@ -16,14 +16,9 @@ struct AdvancedHelpFixture : UiFixture {
 
     void SetUp() override
     {
+        standConfig.shellErrorReporter = [this](int32_t code, const std::string&) { reported.push_back(code); };
+        standChanged();
         UiFixture::SetUp();
-        teststand::setShellErrorReporter([this](int32_t code, const std::string&) { reported.push_back(code); });
-    }
-    void TearDown() override
-    {
-        ui::setHelpOpener({});
-        teststand::setShellErrorReporter({});
-        UiFixture::TearDown();
     }
     // Puts a help file into an application folder, by default the fixture's temporary folder.
     std::string writeHelpFile(QString folder = {})
@@ -56,10 +51,10 @@ struct Code : AdvancedHelpFixture, ::testing::WithParamInterface<CodeCase> {};
 TEST_P(Code, OnlyCodesBelow32AreReported)
 {
     std::vector<std::string> opened;
-    ui::setHelpOpener([&](const std::string& path) {
+    services->helpOpener = [&](const std::string& path) {
         opened.push_back(path);
         return GetParam().openerResult;
-    });
+    };
     ui::openAdvancedHelp();
     EXPECT_EQ(opened, std::vector<std::string>{expectedPath()});
     EXPECT_EQ(reported, GetParam().reported);
@@ -90,7 +85,7 @@ TEST_P(DesktopOpener, GivesShellStyleCodes)
     if (c.program) {
         EXPECT_EQ(ui::desktopOpener(c.program)(path), c.expected);
     }
-    ui::setHelpOpener(c.program ? ui::desktopOpener(c.program) : ui::HelpOpener{});
+    services->helpOpener = c.program ? ui::desktopOpener(c.program) : ui::HelpOpener{};
     ui::openAdvancedHelp();
     EXPECT_EQ(reported, c.expected < 32 ? std::vector<int32_t>{c.expected} : std::vector<int32_t>{});
     if (c.expected < 32) {
@@ -105,7 +100,8 @@ TEST_F(AdvancedHelpFixture, OpenerGetsThePathAsOneArgumentWithoutAShell)
     // An application folder whose name a shell would split and expand.
     const QString folder = dir.filePath("Tavix $HOME 'x' ; y");
     writeHelpFile(folder);
-    teststand::config().appFolder = folder.toStdString();
+    standConfig.appFolder = folder.toStdString();
+    standChanged();
     modMain::GraphInitialize();
 
     // A stand-in opener that writes down its arguments.
@@ -119,7 +115,7 @@ TEST_F(AdvancedHelpFixture, OpenerGetsThePathAsOneArgumentWithoutAShell)
     script.close();
     script.setPermissions(QFile::ReadOwner | QFile::WriteOwner | QFile::ExeOwner);
 
-    ui::setHelpOpener(ui::desktopOpener(opener.toStdString()));
+    services->helpOpener = ui::desktopOpener(opener.toStdString());
     ui::openAdvancedHelp();
     EXPECT_TRUE(reported.empty());
 

@@ -1,7 +1,7 @@
 #pragma once
 // Window tests: the test stand's host objects on a temporary settings file (RequestFixture),
-// GraphInitialize run directly, a chart object bound to the headless window's control, and a
-// scripted prompter that answers the modal dialogs.
+// GraphInitialize run directly, a chart object bound to the headless window's control, and the
+// scripted prompter answering the modal dialogs.
 #include <optional>
 #include <string>
 
@@ -15,21 +15,15 @@
 namespace kg::test {
 
 struct UiFixture : RequestFixture {
-    ui::ScriptedPrompter* prompts = nullptr;
-
     void SetUp() override
     {
         RequestFixture::SetUp();
-        auto scripted = std::make_unique<ui::ScriptedPrompter>();
-        prompts = scripted.get();
-        ui::setPrompter(std::move(scripted));
         modMain::GraphInitialize();
         modMain::chart().Initialize(&modMain::chartWindow().Chart1(), "Header", "", "", "");
     }
     void TearDown() override
     {
         teststand::FaultPlan::clear();
-        ui::setPrompter(std::make_unique<ui::QtPrompter>());
         RequestFixture::TearDown();
     }
 
@@ -46,7 +40,7 @@ struct UiFixture : RequestFixture {
     }
     teststand::SettingsFile settingsFile() const
     {
-        return teststand::SettingsFile(teststand::config().settingsFile);
+        return teststand::SettingsFile(standConfig.settingsFile);
     }
 };
 

@@ -26,7 +26,8 @@ struct HelpFixture : UiFixture {
     {
         UiFixture::SetUp();
         eventLog = dir.filePath("events.log");
-        teststand::config().eventLogFile = eventLog.toStdString();
+        standConfig.eventLogFile = eventLog.toStdString();
+        standChanged();
         modMain::GraphInitialize();  // application services that write the event log
     }
     void TearDown() override
@@ -203,7 +204,7 @@ TEST_F(HelpFixture, ClosingAfterTheChartWindowReleasedTheHostObjectsIsQuiet)
     modMain::releaseSharedObjects();
     closeHelp();
     EXPECT_EQ(chartHelpWindow(), nullptr);
-    EXPECT_TRUE(prompts->messages.empty());
+    EXPECT_TRUE(prompts.messages.empty());
     EXPECT_EQ(storedPlacement("ChartHelp", "Width"), std::nullopt);
 }
 
@@ -213,8 +214,8 @@ TEST_F(HelpFixture, FailingSaveIsReportedAndTheWindowStillCloses)
     teststand::FaultPlan::failOn("AppServices.SaveFormState", 1);
     closeHelp();
     EXPECT_EQ(chartHelpWindow(), nullptr);
-    ASSERT_EQ(prompts->messages.size(), 1u);
-    EXPECT_NE(prompts->messages[0].find("SaveFormState"), std::string::npos) << prompts->messages[0];
+    ASSERT_EQ(prompts.messages.size(), 1u);
+    EXPECT_NE(prompts.messages[0].find("SaveFormState"), std::string::npos) << prompts.messages[0];
 }
 
 TEST_F(HelpFixture, FailingLoadLeavesNoWindow)

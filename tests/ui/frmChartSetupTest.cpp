@@ -90,7 +90,7 @@ struct SetupFixture : UiFixture {
     // The next dialog is worked through `script`.
     void answer(std::string script)
     {
-        prompts->answers.push_back([script](QDialog& d) { work(dynamic_cast<frmChartSetup&>(d), script); });
+        prompts.answers.push_back([script](QDialog& d) { work(dynamic_cast<frmChartSetup&>(d), script); });
     }
     StoredAfter storedAfter() const
     {
@@ -153,7 +153,7 @@ TEST_P(RoundTrip, StoresAndAppliesTheChoice)
     store(c.before);
     answer(c.script);
     ui::showChartSetup();
-    ASSERT_EQ(prompts->dialogsShown, std::vector<std::string>{"frmChartSetup"});
+    ASSERT_EQ(prompts.dialogsShown, std::vector<std::string>{"frmChartSetup"});
     const StoredAfter after = storedAfter();
     for (size_t i = 0; i < kKeys.size(); ++i) EXPECT_EQ(after[i], c.after[i]) << kKeys[i].name;
     EXPECT_EQ(chartState(), c.chart);
@@ -372,7 +372,7 @@ TEST_F(SetupFixture, FailingWriteEndsOkAndLeavesShowChartSetupWithTheError)
 {
     teststand::FaultPlan::failOn("Settings.WriteSetting", 3);  // Elevation
     bool stillOpen = true;
-    prompts->answers.push_back([&](QDialog& d) {
+    prompts.answers.push_back([&](QDialog& d) {
         work(dynamic_cast<frmChartSetup&>(d), "3d ok");
         stillOpen = d.isVisible();
     });

@@ -11,38 +11,29 @@
 #include <QRadioButton>
 #include <QTest>
 
-#include "chart/control/render/ChartPrinting.h"
 #include "chart/control/view/ChartView.h"
 #include "requests/Requests.h"
 #include "ui/QtUi.h"
 #include "ui/frmChartSetup.h"
-#include "ui/frmChoose.h"
 #include "UiFixture.h"
 
 namespace kg {
 namespace {
 
 struct WindowFixture : test::RequestFixture {
-    ui::ScriptedPrompter* prompts = nullptr;
-    ui::QtUi* qtUi = nullptr;
+    std::shared_ptr<ui::QtUi> qtUi = std::make_shared<ui::QtUi>();
 
     void SetUp() override
     {
         test::RequestFixture::SetUp();
-        auto real = std::make_unique<ui::QtUi>();
-        qtUi = real.get();
-        setUiServices(std::move(real));
-        auto scripted = std::make_unique<ui::ScriptedPrompter>();
-        prompts = scripted.get();
-        ui::setPrompter(std::move(scripted));
-        teststand::config().eventLogFile = dir.filePath("events.log").toStdString();
+        services->windows = qtUi;
+        standConfig.eventLogFile = dir.filePath("events.log").toStdString();
+        standChanged();
     }
     void TearDown() override
     {
-        if (qtUi && qtUi->chartWindow()) qtUi->chartWindow()->close();
+        if (qtUi->chartWindow()) qtUi->chartWindow()->close();
         QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);  // the window deletes itself
-        control::setPrintToPdfFile("");
-        ui::setPrompter(std::make_unique<ui::QtPrompter>());
         test::RequestFixture::TearDown();
     }
     ui::frmChart& window() { return *qtUi->chartWindow(); }
@@ -58,16 +49,6 @@ struct WindowFixture : test::RequestFixture {
         QFile f(dir.filePath("events.log"));
         f.open(QIODevice::ReadOnly);
         return f.readAll().toStdString();
-    }
-    // Answers the next data choice dialog: click the option (or Cancel with -99), then OK.
-    void answerChoice(int16_t choice)
-    {
-        prompts->answers.push_back([choice](QDialog& d) {
-            auto& form = dynamic_cast<ui::frmChoose&>(d);
-            if (choice == kChoiceCancelled) return form.Command2->click();
-            form.optData[choice]->click();
-            form.Command1->click();
-        });
     }
 };
 
@@ -135,17 +116,17 @@ TEST_F(WindowFixture, LabelsOnAndOffRedrawFromTheTable)
     EXPECT_TRUE(modMain::goChart->PointLabels());
     window().mnuLabels2->trigger();
     EXPECT_TRUE(window().Chart1().chartLabels.empty());
-    EXPECT_TRUE(prompts->messages.empty());
+    EXPECT_TRUE(prompts.messages.empty());
 }
 
 TEST_F(WindowFixture, PrintWritesTheChart)
 {
     drawHourly();
     const std::string pdf = dir.filePath("printed.pdf").toStdString();
-    control::setPrintToPdfFile(pdf);
+    services->printToPdf = pdf;
     window().mnuPrint->trigger();
     EXPECT_TRUE(QFile::exists(QString::fromStdString(pdf)));
-    EXPECT_TRUE(prompts->messages.empty());
+    EXPECT_TRUE(prompts.messages.empty());
 }
 
 struct RedrawCase {
@@ -163,12 +144,12 @@ TEST_P(Redraw, FollowsTheRecordedChartKind)
     drawHourly();
     const RedrawCase& c = GetParam();
     modMain::giChartKind = c.chartKind;
-    if (c.dialogs) answerChoice(c.choice);
+    if (c.dialogs) prompts.answers.push_back(ui::ScriptedPrompter::choose(c.choice));
     window().mnuRedraw_Click();
-    EXPECT_EQ(int(prompts->dialogsShown.size()), c.dialogs);
+    EXPECT_EQ(int(prompts.dialogsShown.size()), c.dialogs);
     EXPECT_EQ(window().Chart1().header.text, *c.header ? c.header : "Qty of Bookings: Total =  3");
     EXPECT_EQ(modMain::giChartKind, c.chartKind);
-    EXPECT_EQ(uiServices().mousePointer(), kPointerDefault);
+    EXPECT_EQ(mousePointer(), kPointerDefault);
     EXPECT_TRUE(!*c.header || window().mnuRedraw->isVisible());
 }
 
@@ -185,7 +166,7 @@ TEST_F(WindowFixture, SetupRedrawsAfterOkAndAfterCancel)
     drawHourly();
     for (bool ok : {true, false}) {
         window().Chart1().group1.chartType = 99;  // DrawChart sets it back from the chart object
-        prompts->answers.push_back([ok](QDialog& d) {
+        prompts.answers.push_back([ok](QDialog& d) {
             auto& setup = dynamic_cast<ui::frmChartSetup&>(d);
             setup.optChartType[0]->click();  // Plot
             (ok ? setup.Command1 : setup.Command2)->click();
@@ -193,21 +174,21 @@ TEST_F(WindowFixture, SetupRedrawsAfterOkAndAfterCancel)
         window().mnuSetup->trigger();
         EXPECT_EQ(window().Chart1().group1.chartType, control::kPlot) << ok;
     }
-    EXPECT_TRUE(prompts->messages.empty());
+    EXPECT_TRUE(prompts.messages.empty());
 }
 
 TEST_F(WindowFixture, SaveAsAndCopyPutTheChartIntoAReport)
 {
     drawHourly();
     const std::string svg = dir.filePath("chart.svg").toStdString();
-    prompts->saveFiles.push_back(svg);
+    prompts.saveFiles.push_back(svg);
     window().mnuSaveAs->trigger();
     QFile file(QString::fromStdString(svg));
     ASSERT_TRUE(file.open(QIODevice::ReadOnly));
     EXPECT_TRUE(file.readAll().contains("Qty of Bookings: Total =  3"));
 
     window().mnuSaveAs->trigger();  // cancelled: nothing happens
-    EXPECT_TRUE(prompts->messages.empty());
+    EXPECT_TRUE(prompts.messages.empty());
 
     window().mnuCopy->trigger();
     const QImage copied = QApplication::clipboard()->image();

@@ -12,18 +12,12 @@
 namespace kg::control {
 
 namespace {
-std::string& pdfFile()
+std::unique_ptr<QPrinter> openPrinter(const std::string& pdfFile)
 {
-    static std::string path;
-    return path;
-}
-
-std::unique_ptr<QPrinter> openPrinter()
-{
-    if (!pdfFile().empty()) {
+    if (!pdfFile.empty()) {
         auto printer = std::make_unique<QPrinter>(QPrinter::HighResolution);
         printer->setOutputFormat(QPrinter::PdfFormat);
-        printer->setOutputFileName(QString::fromStdString(pdfFile()));
+        printer->setOutputFileName(QString::fromStdString(pdfFile));
         return printer;
     }
     const QPrinterInfo info = QPrinterInfo::defaultPrinter();
@@ -38,13 +32,10 @@ QString printerName(const QPrinter& printer)
 }
 }  // namespace
 
-void setPrintToPdfFile(const std::string& path) { pdfFile() = path; }
-const std::string& printToPdfFile() { return pdfFile(); }
-
-void printChart(const ChartControl& chart, const PrintRequest& request)
+void printChart(const ChartControl& chart, const PrintRequest& request, const std::string& pdfFile)
 {
     (void)request;  // the outside control's print codes; one layout serves them all
-    std::unique_ptr<QPrinter> printer = openPrinter();
+    std::unique_ptr<QPrinter> printer = openPrinter(pdfFile);
     printer->setPageOrientation(QPageLayout::Landscape);
     printer->setDocName(QStringLiteral("KarstGraph chart"));
     printer->setCreator(QStringLiteral("KarstGraph"));
@@ -65,6 +56,11 @@ void printChart(const ChartControl& chart, const PrintRequest& request)
                     "Printer error: printing to " + printerName(*printer).toStdString() + " failed");
 }
 
-void installPrinting(ChartControl& chart) { chart.setPrintHandler(printChart); }
+void installPrinting(ChartControl& chart, PrintTarget target)
+{
+    chart.setPrintHandler([target = std::move(target)](const ChartControl& c, const PrintRequest& request) {
+        printChart(c, request, target ? target() : std::string());
+    });
+}
 
 }  // namespace kg::control
