@@ -15,7 +15,6 @@ enum class TotalForm { Plain, Dollars, Whole };
 using Builder = void (*)(builders::BuildContext&, const builders::GridChart&);
 
 struct GridRequestRow {
-    const char* grid;
     int16_t requestKind;
     const char* header;
     TotalForm total;
@@ -27,15 +26,15 @@ const GridRequestRow& rowOf(GridRequest r)
 {
     using namespace builders;
     static const GridRequestRow rows[] = {
-        {"grid1", kHourlyRequest, "Qty of Bookings: Total = ", TotalForm::Plain, "Quantity", DrawHourlyGraph},
-        {"grid2", kHourlyRequest, "Value of Bookings: Total = ", TotalForm::Dollars, "Value", DrawHourlyGraph},
-        {"grid3", kHourlyRequest, "Average Value of Bookings: Total = ", TotalForm::Dollars, "Value", DrawHourlyGraph},
-        {"grid1", kPropGraphRequest, "New Bookings: Total = ", TotalForm::Plain, "Quantity", DrawPropGraph},
-        {"grid2", kPropGraphRequest, "Continuing Jobs: Total = ", TotalForm::Whole, "Value", DrawPropGraph},
-        {"grid3", kPropGraphRequest, "Nett Jobs By Month: Total = ", TotalForm::Whole, "Value", DrawPropGraph},
-        {"grid1", kYearlyRequest, "Quantity of Bookings: Total = ", TotalForm::Plain, "Quantity", DrawYearlyRpt},
-        {"grid2", kYearlyRequest, "Total Value of Jobs: Total = ", TotalForm::Dollars, "Value", DrawYearlyRpt},
-        {"grid3", kYearlyRequest, "Average Value of Jobs: Total = ", TotalForm::Dollars, "Value", DrawYearlyRpt},
+        {kHourlyRequest, "Qty of Bookings: Total = ", TotalForm::Plain, "Quantity", DrawHourlyGraph},
+        {kHourlyRequest, "Value of Bookings: Total = ", TotalForm::Dollars, "Value", DrawHourlyGraph},
+        {kHourlyRequest, "Average Value of Bookings: Total = ", TotalForm::Dollars, "Value", DrawHourlyGraph},
+        {kPropGraphRequest, "New Bookings: Total = ", TotalForm::Plain, "Quantity", DrawPropGraph},
+        {kPropGraphRequest, "Continuing Jobs: Total = ", TotalForm::Whole, "Value", DrawPropGraph},
+        {kPropGraphRequest, "Nett Jobs By Month: Total = ", TotalForm::Whole, "Value", DrawPropGraph},
+        {kYearlyRequest, "Quantity of Bookings: Total = ", TotalForm::Plain, "Quantity", DrawYearlyRpt},
+        {kYearlyRequest, "Total Value of Jobs: Total = ", TotalForm::Dollars, "Value", DrawYearlyRpt},
+        {kYearlyRequest, "Average Value of Jobs: Total = ", TotalForm::Dollars, "Value", DrawYearlyRpt},
     };
     return rows[static_cast<int>(r)];
 }
@@ -52,11 +51,11 @@ std::string writeTotal(const Variant& total, TotalForm form)
 
 }  // namespace
 
-void generateGridChart(GridRequest request, int32_t numSeries, const Variant& total)
+void generateGridChart(GridRequest request, const char* gridName, int32_t numSeries, const Variant& total)
 {
     const GridRequestRow& row = rowOf(request);
     GraphInitialize();
-    const Variant gridObject = call(gvSourceForm, row.grid);
+    const Variant gridObject = call(gvSourceForm, gridName);
     builders::LateBoundGrid grid(gridObject);
     // Both halves are evaluated, the grid's Rows before its FixedRows.
     const bool noTotal = total.isEmpty();

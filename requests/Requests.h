@@ -13,7 +13,8 @@ enum class GridRequest {
     PropGraph1, PropGraph2, PropGraph3,
     YearlyRpt1, YearlyRpt2, YearlyRpt3,
 };
-void generateGridChart(GridRequest request, int32_t numSeries, const Variant& total);
+// `grid`: the source form member the request charts.
+void generateGridChart(GridRequest request, const char* grid, int32_t numSeries, const Variant& total);
 
 // The measure-choice requests: bookings by quote type, and sales declaration / service categories.
 void GenerateChart_BookingsReport();

@@ -42,24 +42,24 @@ DispId cTavixGraph::idOfName(std::string_view name) const
 void cTavixGraph::SourceForm(const Variant& form)
 {
     Args args{form};
-    handlers::SourceForm(args);
+    handlers::SourceForm(operationNamed("SourceForm"), args);
 }
 
 void cTavixGraph::GraphInitialize() { modMain::GraphInitialize(); }
 
 namespace handlers {
-void SourceForm(Args& args)
+void SourceForm(const Operation&, Args& args)
 {
     const Variant& form = args[0];
     if (!form.isObject()) throw Error::typeMismatch("SourceForm expects an object, not a " +
                                                     std::string(typeName(form.type())));
     modMain::gvSourceForm = form;
 }
-void GraphInitialize(Args&) { modMain::GraphInitialize(); }
-void BookingsReport(Args&) { requests::GenerateChart_BookingsReport(); }
-void SalesDeclaration(Args&) { requests::GenerateChart_SalesDeclaration(); }
-void JobStatusReport(Args&) { requests::GenerateChart_JobStatusReport(); }
-void ServCatSumm(Args&) { requests::GenerateChart_ServCatSumm(); }
+void GraphInitialize(const Operation&, Args&) { modMain::GraphInitialize(); }
+void BookingsReport(const Operation&, Args&) { requests::GenerateChart_BookingsReport(); }
+void SalesDeclaration(const Operation&, Args&) { requests::GenerateChart_SalesDeclaration(); }
+void JobStatusReport(const Operation&, Args&) { requests::GenerateChart_JobStatusReport(); }
+void ServCatSumm(const Operation&, Args&) { requests::GenerateChart_ServCatSumm(); }
 }  // namespace handlers
 
 Variant cTavixGraph::invoke(DispId id, uint16_t kind, Args& args)
@@ -90,7 +90,7 @@ Variant cTavixGraph::dispatch(const Operation& op, uint16_t kind, Args& args)
     case ArgumentShape::None: expectArgs(args, 0, op.name); break;
     case ArgumentShape::SeriesAndTotal: expectArgs(args, 2, op.name); break;
     }
-    op.handler(args);
+    op.handler(op, args);
     return {};
 }
 

@@ -33,24 +33,9 @@ constexpr const char* kInterfaceName = "_cTavixGraph";
 enum class OperationKind { PropertyPut, Method };
 // What a call passes: the form object, nothing, or lNumSeries and vTotal.
 enum class ArgumentShape { Form, None, SeriesAndTotal };
+struct Operation;
 // Runs the operation on arguments already counted against the shape.
-using OperationHandler = void (*)(Args& args);
-
-namespace handlers {
-void SourceForm(Args& args);
-void GraphInitialize(Args& args);
-void BookingsReport(Args& args);
-void SalesDeclaration(Args& args);
-void JobStatusReport(Args& args);
-void ServCatSumm(Args& args);
-template <requests::GridRequest request>
-void grid(Args& args)
-{
-    // lNumSeries is a 32-bit whole number: a value of another type is coerced as the caller's
-    // automation layer would, failing with Type mismatch or Overflow.
-    requests::generateGridChart(request, toLong(args[0]), args[1]);
-}
-}  // namespace handlers
+using OperationHandler = void (*)(const Operation& op, Args& args);
 
 struct Operation {
     int slot;
@@ -63,6 +48,22 @@ struct Operation {
     bool measureChoice;  // asks the data choice dialog
     OperationHandler handler;
 };
+
+namespace handlers {
+void SourceForm(const Operation& op, Args& args);
+void GraphInitialize(const Operation& op, Args& args);
+void BookingsReport(const Operation& op, Args& args);
+void SalesDeclaration(const Operation& op, Args& args);
+void JobStatusReport(const Operation& op, Args& args);
+void ServCatSumm(const Operation& op, Args& args);
+template <requests::GridRequest request>
+void grid(const Operation& op, Args& args)
+{
+    // lNumSeries is a 32-bit whole number: a value of another type is coerced as the caller's
+    // automation layer would, failing with Type mismatch or Overflow.
+    requests::generateGridChart(request, op.grid, toLong(args[0]), args[1]);
+}
+}  // namespace handlers
 
 namespace ops {
 using K = OperationKind;
