@@ -1,5 +1,7 @@
 #include "files/IniDocument.h"
 
+#include "core/Dispatch.h"
+
 namespace kg::files {
 
 namespace {
@@ -146,15 +148,8 @@ QByteArray IniDocument::serialize() const
 bool IniDocument::sameName(QByteArrayView a, QByteArrayView b) const
 {
     if (syntax_ == Syntax::IniFormat) return a == b;
-    // ASCII letters only: names are ids and paths, and other bytes are parts of UTF-8 characters.
-    if (a.size() != b.size()) return false;
-    for (qsizetype i = 0; i < a.size(); ++i) {
-        unsigned char x = static_cast<unsigned char>(a[i]), y = static_cast<unsigned char>(b[i]);
-        if (unsigned(x - 'A') < 26u) x |= 0x20;
-        if (unsigned(y - 'A') < 26u) y |= 0x20;
-        if (x != y) return false;
-    }
-    return true;
+    // ASCII letters only, as member names are matched: other bytes are parts of UTF-8 characters.
+    return equalsNoCase(std::string_view(a.data(), size_t(a.size())), std::string_view(b.data(), size_t(b.size())));
 }
 
 IniDocument::Section* IniDocument::find(QByteArrayView name)
