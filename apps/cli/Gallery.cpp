@@ -3,7 +3,6 @@
 #include <QApplication>
 #include <QDir>
 #include <QFile>
-#include <QSaveFile>
 #include <cstdio>
 #include <string>
 #include <vector>
@@ -13,6 +12,7 @@
 #include "chart/ChartStyle.h"
 #include "core/Convert.h"
 #include "core/Error.h"
+#include "files/WholeFile.h"
 #include "requests/Services.h"
 #include "teststand/SampleData.h"
 #include "teststand/TestStand.h"
@@ -53,10 +53,11 @@ std::vector<Chart> galleryCharts(const kg::teststand::SampleTotals& totals)
             charts.push_back({std::string(request) + ", choice " + std::to_string(choice),
                               {request, std::nullopt, kg::Variant(), choice}, {}});
     charts.push_back({"GenerateChart_JobStatusReport", {"GenerateChart_JobStatusReport", {}, kg::Variant(), {}}, {}});
-    for (const char* type : {"Bar", "Plot", "Area", "Pie"})
+    for (const kg::chartstyle::StyleName& name : kg::chartstyle::kStyleNames)
         for (bool view3D : {false, true}) {
+            const char* type = name.name;
             Style style{type, view3D, true};
-            const bool pie = std::string(type) == "Pie";
+            const bool pie = name.type == kg::control::kPie;
             const char* request = pie ? "GenerateChart_BookingsReport" : "GenerateChart_PropGraph1";
             kg::cli::RequestCall call{request, std::nullopt, kg::Variant(totals.quantity),
                                       pie ? std::optional<int16_t>(1) : std::nullopt};
@@ -117,9 +118,10 @@ void writeIndex(const std::string& folder, const std::vector<Entry>& entries)
         page += "</div>\n";
     }
     page += "</body></html>\n";
-    QSaveFile file(QString::fromStdString(folder + "/index.html"));
-    if (!file.open(QIODevice::WriteOnly) || file.write(page.data(), qint64(page.size())) < 0 || !file.commit())
-        throw kg::Error(kg::errc::PathFileAccess, "Cannot write " + folder + "/index.html");
+    const std::string path = folder + "/index.html";
+    if (const auto failure = kg::files::writeWholeFile(QString::fromStdString(path),
+                                                       QByteArray::fromStdString(page), kg::files::Sync::None))
+        throw kg::Error(kg::errc::PathFileAccess, "Cannot write " + path + ": " + failure->reason.toStdString());
 }
 
 }  // namespace
