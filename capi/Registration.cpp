@@ -1,7 +1,6 @@
 #include "capi/Registration.h"
 
 #include <QDir>
-#include <QFile>
 #include <QFileInfo>
 
 #include "core/Error.h"
@@ -46,12 +45,9 @@ Error accessError(const std::string& file, const std::string& what)
 
 IniDocument read(const std::string& file)
 {
-    QFile f(QString::fromStdString(file));
-    if (!f.exists()) return IniDocument(IniDocument::Syntax::Lines);
-    if (!f.open(QIODevice::ReadOnly)) throw accessError(file, "cannot be read: " + f.errorString().toStdString());
-    const QByteArray text = f.readAll();
-    if (f.error() != QFileDevice::NoError)
-        throw accessError(file, "cannot be read: " + f.errorString().toStdString());
+    QByteArray text;
+    if (const auto reason = files::readWholeFile(QString::fromStdString(file), text))
+        throw accessError(file, "cannot be read: " + reason->toStdString());
     return IniDocument::parse(text, IniDocument::Syntax::Lines);
 }
 

@@ -70,23 +70,30 @@ std::optional<WriteFailure> writeWholeFile(const QString& path, const QByteArray
     if (fd < 0) return failure(WriteFailure::Open, errno);
     struct stat old {};
     if (::stat(to.constData(), &old) == 0 && S_ISREG(old.st_mode)) ::fchmod(fd, old.st_mode & 07777);  // keeps its mode
-    const auto giveUp = [&](WriteFailure::Step step, int error) {
-        ::close(fd);
+    // The temporary file goes, whatever failed; errno is taken before anything can change it.
+    const auto discard = [&](WriteFailure::Step step, int error) {
         ::unlink(from.constData());
         return failure(step, error);
     };
-    if (!writeAll(fd, bytes.constData(), size_t(bytes.size()))) return giveUp(WriteFailure::Write, errno);
-    if (sync == Sync::ToDisk && ::fsync(fd) != 0) return giveUp(WriteFailure::Sync, errno);
-    if (::close(fd) != 0) {
-        const int error = errno;
-        ::unlink(from.constData());
-        return failure(WriteFailure::Write, error);
-    }
-    if (std::rename(from.constData(), to.constData()) != 0) {
-        const int error = errno;
-        ::unlink(from.constData());
-        return failure(WriteFailure::Rename, error);
-    }
+    const auto closeAndDiscard = [&](WriteFailure::Step step, int error) {
+        ::close(fd);
+        return discard(step, error);
+    };
+    if (!writeAll(fd, bytes.constData(), size_t(bytes.size()))) return closeAndDiscard(WriteFailure::Write, errno);
+    if (sync == Sync::ToDisk && ::fsync(fd) != 0) return closeAndDiscard(WriteFailure::Sync, errno);
+    if (::close(fd) != 0) return discard(WriteFailure::Write, errno);
+    if (std::rename(from.constData(), to.constData()) != 0) return discard(WriteFailure::Rename, errno);
+    return std::nullopt;
+}
+
+std::optional<QString> readWholeFile(const QString& path, QByteArray& bytes)
+{
+    bytes.clear();
+    QFile file(path);
+    if (!file.exists()) return std::nullopt;
+    if (!file.open(QIODevice::ReadOnly)) return file.errorString();
+    bytes = file.readAll();
+    if (file.error() != QFileDevice::NoError) return file.errorString();
     return std::nullopt;
 }
 

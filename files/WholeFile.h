@@ -28,4 +28,8 @@ struct WriteFailure {
 // permissions; a new file gets those an ordinary new file would). Nothing when it worked.
 std::optional<WriteFailure> writeWholeFile(const QString& path, const QByteArray& bytes, Sync sync);
 
+// Reads the whole file at `path` into `bytes`; a file that does not exist reads as empty. The
+// system's reason when it exists but cannot be read.
+std::optional<QString> readWholeFile(const QString& path, QByteArray& bytes);
+
 }  // namespace kg::files

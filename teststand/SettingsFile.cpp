@@ -1,7 +1,6 @@
 #include "teststand/SettingsFile.h"
 
 #include <QDir>
-#include <QFile>
 #include <QFileInfo>
 #include <QLockFile>
 
@@ -22,14 +21,9 @@ namespace {
 // The file's entries; none for a file that does not exist yet.
 rawini::Entries readEntries(const std::string& path)
 {
-    const QString file = QString::fromStdString(path);
-    if (!QFileInfo::exists(file)) return {};
-    QFile f(file);
-    if (!f.open(QIODevice::ReadOnly))
-        fail("The settings file \"" + path + "\" cannot be read: " + f.errorString().toStdString());
-    const QByteArray text = f.readAll();
-    if (f.error() != QFileDevice::NoError)
-        fail("The settings file \"" + path + "\" cannot be read: " + f.errorString().toStdString());
+    QByteArray text;
+    if (const auto reason = files::readWholeFile(QString::fromStdString(path), text))
+        fail("The settings file \"" + path + "\" cannot be read: " + reason->toStdString());
     return rawini::entriesOf(text);
 }
 
