@@ -17,7 +17,7 @@ void QtPrompter::showMessage(const std::string& text)
     box.exec();
 }
 
-int16_t QtPrompter::chooseData(ChoiceDialog dialog)
+int16_t WindowPrompter::chooseData(ChoiceDialog dialog)
 {
     frmChoose form(dialog);
     execModal(form);
@@ -37,9 +37,7 @@ int16_t ScriptedPrompter::chooseData(ChoiceDialog dialog)
 {
     if (choices.empty()) {
         if (answers.empty()) return NoScreenPrompter().chooseData(dialog);
-        frmChoose form(dialog);
-        execModal(form);
-        return form.iChoice;
+        return WindowPrompter::chooseData(dialog);
     }
     dialogsShown.push_back(dialog == ChoiceDialog::QuoteType ? "frmChoose1" : "frmChoose2");
     const int16_t choice = choices.front();

@@ -19,6 +19,8 @@ constexpr const char* kAppTitle = "KarstGraph";
 // What the windows ask besides the requests' prompts.
 class WindowPrompter : public Prompter {
 public:
+    // frmChoose1 or frmChoose2, run through execModal.
+    int16_t chooseData(ChoiceDialog dialog) override;
     // Runs the dialog modally; returns when it has closed.
     virtual void execModal(QDialog& dialog) = 0;
     // Asks for a file to write; empty when the user cancelled. `filter` as QFileDialog takes it.
@@ -28,8 +30,6 @@ public:
 class QtPrompter : public WindowPrompter {
 public:
     void showMessage(const std::string& text) override;
-    // frmChoose1 or frmChoose2, modally.
-    int16_t chooseData(ChoiceDialog dialog) override;
     void execModal(QDialog& dialog) override;
     std::string askSaveFile(const std::string& caption, const std::string& filter) override;
 };
