@@ -101,23 +101,21 @@ T c2dChart::readWholeSetting(chartstyle::Key key)
 {
     const std::string text = readSetting(key);
     const chartstyle::KeyInfo& info = chartstyle::infoOf(key);
-    try {
-        const double v = readNumber(text);
+    const auto whole = [](double v) -> T {
         if constexpr (std::is_same_v<T, int16_t>)
             return roundToInteger(v);
         else
             return roundToLong(v);
+    };
+    try {
+        return whole(readNumber(text));
     } catch (const Error& e) {
         if (e.number() != errc::Overflow) throw;
         Args log{std::string("SettingOutOfRange"),
                  std::string(chartstyle::kSection) + "\\" + info.name + "=" + text + " (default " + info.defaultValue +
                      " used)"};
         call(appServices_(), "LogFormEvent", log);
-        const double v = readNumber(info.defaultValue);
-        if constexpr (std::is_same_v<T, int16_t>)
-            return roundToInteger(v);
-        else
-            return roundToLong(v);
+        return whole(readNumber(info.defaultValue));
     }
 }
 
