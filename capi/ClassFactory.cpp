@@ -21,17 +21,8 @@ struct ClassFactory : KGClassFactory {
 
 ClassFactory& self(KGClassFactory* f) { return *static_cast<ClassFactory*>(f); }
 
-uint32_t factoryAddRef(KGClassFactory* f) { return ++self(f).refs; }
-
-uint32_t factoryRelease(KGClassFactory* f)
-{
-    const uint32_t left = --self(f).refs;
-    if (left == 0) {
-        delete &self(f);
-        handleDestroyed();
-    }
-    return left;
-}
+uint32_t factoryAddRef(KGClassFactory* f) { return addRefHandle(self(f)); }
+uint32_t factoryRelease(KGClassFactory* f) { return releaseHandle(self(f)); }
 
 int32_t factoryCreateInstance(KGClassFactory*, KGObject** out)
 {

@@ -20,17 +20,8 @@ struct ExportedObject : KGObject {
 
 ExportedObject& self(KGObject* obj) { return *static_cast<ExportedObject*>(obj); }
 
-uint32_t exportedAddRef(KGObject* obj) { return ++self(obj).refs; }
-
-uint32_t exportedRelease(KGObject* obj)
-{
-    const uint32_t left = --self(obj).refs;
-    if (left == 0) {
-        delete &self(obj);
-        handleDestroyed();
-    }
-    return left;
-}
+uint32_t exportedAddRef(KGObject* obj) { return addRefHandle(self(obj)); }
+uint32_t exportedRelease(KGObject* obj) { return releaseHandle(self(obj)); }
 
 int32_t exportedGetIDOfName(KGObject* obj, const char* name, int32_t* dispid)
 {

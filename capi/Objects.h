@@ -24,4 +24,21 @@ long liveHandles() noexcept;
 void handleCreated() noexcept;
 void handleDestroyed() noexcept;
 
+// AddRef and Release of a handle with an atomic `refs`: the last Release deletes it.
+template <class Handle>
+uint32_t addRefHandle(Handle& handle)
+{
+    return ++handle.refs;
+}
+template <class Handle>
+uint32_t releaseHandle(Handle& handle)
+{
+    const uint32_t left = --handle.refs;
+    if (left == 0) {
+        delete &handle;
+        handleDestroyed();
+    }
+    return left;
+}
+
 }  // namespace kg::capi
